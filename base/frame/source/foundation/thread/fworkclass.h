@@ -1,0 +1,16 @@
+#pragma once
+
+/// A unit of work for a worker thread.
+class FWorkClass
+{
+public:
+    /// The work itself, on the worker thread.
+    virtual void performThreadWork(void* data) = 0;
+    /// Gives the object up, after its work or without it; here it deletes itself.
+    virtual void finished() = 0;
+    /// Asks the running work to stop early. Called by any thread.
+    virtual void cancelWork() {}
+
+protected:
+    ~FWorkClass() = default;
+};
