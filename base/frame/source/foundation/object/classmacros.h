@@ -31,64 +31,78 @@ template <class Self>
 struct FAllBut
 {
     template <class T>
-        requires(!std::is_same_v<T, Self>)
-    operator FDeclaredAs<T>() const;
+    requires(!std::is_same_v<T, Self>) operator FDeclaredAs<T>() const;
 };
 FClassTag<void> fNearestDeclaredClass(const void*, FDeclaredAs<void>);
 
 // Overload resolution finds the nearest declared ancestor: the class's own overload is left out by FAllBut, and of
 // the others the most derived one wins.
-#define FCHECK_BASE_(Class, Base)                                                                                 \
-    friend FClassTag<Class> fNearestDeclaredClass(const Class*, FDeclaredAs<Class>);                              \
-    void __fCheckDeclaration() const                                                                              \
-    {                                                                                                             \
-        static_assert(std::is_same_v<std::remove_cvref_t<decltype(*this)>, Class>, "declared for another class"); \
-        static_assert(std::is_same_v<decltype(fNearestDeclaredClass(static_cast<const Class*>(nullptr),           \
-                                                                    FAllBut<Class>{})),                           \
-                                     FClassTag<Base>>,                                                            \
-                      #Base " is not the direct base of " #Class);                                                \
+#define FCHECK_BASE_(Class, Base)                                                                            \
+    friend FClassTag<Class> fNearestDeclaredClass(const Class*, FDeclaredAs<Class>);                         \
+    void __fCheckDeclaration() const                                                                         \
+    {                                                                                                        \
+        static_assert(std::is_same_v<std::remove_cvref_t<decltype(*this)>, Class>,                           \
+                      "declared for another class");                                                         \
+        static_assert(std::is_same_v<decltype(fNearestDeclaredClass(static_cast<const Class*>(nullptr),      \
+                                                                    FAllBut<Class>{})),                      \
+                                     FClassTag<Base>>,                                                       \
+                      #Base " is not the direct base of " #Class);                                           \
     }
 
-#define DECLARE_TYPE(Class, Base)                                                                                 \
-private:                                                                                                          \
-    FCHECK_BASE_(Class, Base)                                                                                     \
-public:                                                                                                           \
-    const char* isA() const override { return #Class; }                                                           \
-    bool isA(const char* name) const override { return Class::isTypeOf(name, false); }                            \
-    bool isTypeOf(const char* name, bool askBaseClass) const override                                             \
-    {                                                                                                             \
-        if (name && strcmp(name, #Class) == 0)                                                                    \
-            return true;                                                                                          \
-        return askBaseClass && Base::isTypeOf(name, true);                                                        \
+#define DECLARE_TYPE(Class, Base)                                                                            \
+private:                                                                                                     \
+    FCHECK_BASE_(Class, Base)                                                                                \
+public:                                                                                                      \
+    const char* isA() const override                                                                         \
+    {                                                                                                        \
+        return #Class;                                                                                       \
+    }                                                                                                        \
+    bool isA(const char* name) const override                                                                \
+    {                                                                                                        \
+        return Class::isTypeOf(name, false);                                                                 \
+    }                                                                                                        \
+    bool isTypeOf(const char* name, bool askBaseClass) const override                                        \
+    {                                                                                                        \
+        if (name && strcmp(name, #Class) == 0)                                                               \
+            return true;                                                                                     \
+        return askBaseClass && Base::isTypeOf(name, true);                                                   \
     }
 
-#define DECLARE_COPYABLE(Class, Base)                                                                             \
-    DECLARE_TYPE(Class, Base)                                                                                     \
-    CmObject* newCopy() const override { return new Class(*this); }
+#define DECLARE_COPYABLE(Class, Base)                                                                        \
+    DECLARE_TYPE(Class, Base)                                                                                \
+    CmObject* newCopy() const override                                                                       \
+    {                                                                                                        \
+        return new Class(*this);                                                                             \
+    }
 
-#define FDECLARE_DESCRIPTOR_                                                                                      \
-    static MetaClass __fClass;                                                                                    \
-    MetaClass* getClass() const override { return &__fClass; }
+#define FDECLARE_DESCRIPTOR_                                                                                 \
+    static MetaClass __fClass;                                                                               \
+    MetaClass* getClass() const override                                                                     \
+    {                                                                                                        \
+        return &__fClass;                                                                                    \
+    }
 
-#define DECLARE_ABSTRACT_CLASS(Class, Base)                                                                       \
-    DECLARE_TYPE(Class, Base)                                                                                     \
+#define DECLARE_ABSTRACT_CLASS(Class, Base)                                                                  \
+    DECLARE_TYPE(Class, Base)                                                                                \
+    CmObject* newCopy() const override = 0;                                                                  \
     FDECLARE_DESCRIPTOR_
 
-#define DECLARE_DESCRIBED_CLASS(Class, Base)                                                                      \
-    DECLARE_COPYABLE(Class, Base)                                                                                 \
+#define DECLARE_DESCRIBED_CLASS(Class, Base)                                                                 \
+    DECLARE_COPYABLE(Class, Base)                                                                            \
     FDECLARE_DESCRIPTOR_
 
-#define DECLARE_CLASS(Class, Base)                                                                                \
-    DECLARE_DESCRIBED_CLASS(Class, Base)                                                                          \
+#define DECLARE_CLASS(Class, Base)                                                                           \
+    DECLARE_DESCRIBED_CLASS(Class, Base)                                                                     \
     static FUnknown* __fCreate();
 
-#define DEFINE_ABSTRACT_CLASS(Class, Base) MetaClass Class::__fClass(#Class, nullptr, nullptr, &Base::__fClass, 0);
+#define DEFINE_ABSTRACT_CLASS(Class, Base)                                                                   \
+    MetaClass Class::__fClass(#Class, nullptr, nullptr, &Base::__fClass, 0);
 #define DEFINE_DESCRIBED_CLASS(Class, Base) DEFINE_ABSTRACT_CLASS(Class, Base)
 
-#define DEFINE_CLASS_VERSION(Class, Base, version)                                                                \
-    MetaClass Class::__fClass(#Class, &Class::__fCreate, nullptr, &Base::__fClass, version);                      \
-    FUnknown* Class::__fCreate()                                                                                  \
-    {                                                                                                             \
-        return static_cast<CmObject*>(new Class);                                                                 \
+#define DEFINE_CLASS_VERSION(Class, Base, version)                                                           \
+    MetaClass Class::__fClass(#Class, &Class::__fCreate, nullptr, &Base::__fClass, version);                 \
+    FUnknown* Class::__fCreate()                                                                             \
+    {                                                                                                        \
+        return static_cast<CmObject*>(new Class);                                                            \
     }
 #define DEFINE_CLASS(Class, Base) DEFINE_CLASS_VERSION(Class, Base, 0)

@@ -33,17 +33,23 @@ int32 FObject::queryInterface(const char* interfaceID, void** object)
 
 uint32 FObject::addRef()
 {
-    FAtomicIncrement(refCount);
-    return static_cast<uint32>(refCount);
+    return static_cast<uint32>(FAtomicIncrement(refCount) + 1);
 }
 
 uint32 FObject::release()
 {
-    if (FAtomicDecrement(refCount) != 1)
-        return static_cast<uint32>(refCount);
+    // The member must not be read after the decrement: another thread may have deleted the object by then.
+    const int before = FAtomicDecrement(refCount);
+    if (before != 1)
+        return static_cast<uint32>(before - 1);
     refCount = kDying;
     delete this;
     return 0;
+}
+
+uint32 FObject::getRefCount() const
+{
+    return static_cast<uint32>(FAtomicAdd(refCount, 0));
 }
 
 void FObject::update(FUnknown*, int) {}

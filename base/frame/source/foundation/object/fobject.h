@@ -41,7 +41,7 @@ public:
     void addDependent(IDependent* dependent);
     void removeDependent(IDependent* dependent);
 
-    uint32 getRefCount() const { return static_cast<uint32>(refCount); }
+    uint32 getRefCount() const;
 
     /// Asks an FUnknown whether it is an FObject. Made anew in each run: never store it.
     static const FUID iid;
@@ -49,7 +49,7 @@ public:
     static IUpdateHandler* gUpdateHandler;
 
 private:
-    volatile int refCount = 1;
+    mutable volatile int refCount = 1;
 };
 
 /// The FObject behind `unknown`, borrowed; null where there is none.

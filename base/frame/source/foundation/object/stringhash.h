@@ -1,0 +1,9 @@
+#pragma once
+
+#include "foundation/object/types.h"
+
+/// Bucket numbers below `size` for zero-terminated text; 0 for a null or empty one.
+///
+/// They depend on the width: an 8-bit character counts with its sign.
+unsigned hashString8(const char* text, unsigned size);
+unsigned hashString16(const char16* text, unsigned size);
