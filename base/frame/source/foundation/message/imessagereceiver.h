@@ -1,0 +1,15 @@
+#pragma once
+
+#include "foundation/object/funknown.h"
+
+class IMessage;
+
+/// Somebody outside the class tree who takes messages.
+class IMessageReceiver : public FUnknown
+{
+public:
+    /// The message belongs to the caller.
+    virtual int32 notify(IMessage* message) = 0;
+
+    DECLARE_INTERFACE_ID
+};
