@@ -1,0 +1,140 @@
+#pragma once
+
+#include "foundation/text/conststring.h"
+
+#include <cstdarg>
+
+class IAttributes;
+
+/// A text that owns its characters and changes their width when it must.
+///
+/// The buffer comes from `malloc` and is exactly as large as the text; there is no spare room. A default String is
+/// empty and wide. An empty String takes the width of what is put into it; a narrow one becomes wide when 16-bit
+/// text is added; nothing here makes a wide one narrow but `text8`, `toMultiByte` and a new content.
+///
+/// Beware: `text8`, `text16`, `getChar8` and `getChar16` convert the text in place, const or not, and what the
+/// 8-bit encoding can't hold is then lost. So even reading is for one thread at a time. Where memory runs out, the
+/// text stays as it was.
+class String : public ConstString
+{
+public:
+    String() { isWide = 1; }
+    /// `count` and `isTerminated` as in `assign`.
+    String(const char* text, int count = -1, bool isTerminated = true);
+    String(const char16* text, int count = -1, bool isTerminated = true);
+    String(const ConstString& text, int count = -1);
+    String(const String& text, int count = -1);
+    String(String&& other) noexcept;
+    String(const FVariant& variant);
+    ~String() override;
+
+    String& operator=(const String& other) { return assign(other); }
+    String& operator=(String&& other) noexcept;
+    String& operator=(const ConstString& text) { return assign(text); }
+    String& operator=(const char* text) { return assign(text); }
+    String& operator=(const char16* text) { return assign(text); }
+
+    const char* text8() const override;
+    const char16* text16() const override;
+    char getChar8(unsigned index) const override;
+    char16 getChar16(unsigned index) const override;
+
+    /// Makes room for `newLength` characters of the width; neither sets the length nor converts what is there.
+    /// `fill` writes spaces from the present length on. 0 frees the buffer.
+    bool resize(unsigned newLength, bool wide, bool fill = false);
+
+    // Content. A negative `count` means all. Without `isTerminated`, exactly `count` characters are taken.
+    String& assign(const char* text, int count = -1, bool isTerminated = true);
+    String& assign(const char16* text, int count = -1, bool isTerminated = true);
+    String& assign(const ConstString& text, int count = -1);
+    String& assign(char character, int count = 1);
+    String& assign(char16 character, int count = 1);
+    String& append(const char* text, int count = -1);
+    String& append(const char16* text, int count = -1);
+    String& append(const ConstString& text, int count = -1);
+    String& append(char character, int count = 1);
+    String& append(char16 character, int count = 1);
+    String& operator+=(const ConstString& text) { return append(text); }
+    /// Past the end nothing happens.
+    String& insertAt(unsigned index, const char* text, int count = -1);
+    String& insertAt(unsigned index, const char16* text, int count = -1);
+    String& insertAt(unsigned index, const ConstString& text, int count = -1);
+    String& insertAt(unsigned index, char character) { return insertAt(index, &character, 1, false); }
+    String& insertAt(unsigned index, char16 character) { return insertAt(index, &character, 1, false); }
+    /// Puts at most `textCount` characters of `text` in the place of `count` characters at `index`.
+    String& replace(unsigned index, int count, const char* text, int textCount = -1);
+    String& replace(unsigned index, int count, const char16* text, int textCount = -1);
+    String& replace(unsigned index, int count, const ConstString& text, int textCount = -1);
+    /// Replaces the first occurrence or all, from the left. Gives the number of replacements.
+    int replace(const char* from, const char* to, bool all = true);
+    int replace(const char16* from, const char16* to, bool all = true);
+    String& remove(unsigned index = 0, int count = -1);
+    /// Whether the text changed; so do those that follow.
+    bool removeSubString(const ConstString& text);
+    bool removeChars(CharGroup group);
+    bool removeChars8(const char* set);
+    bool removeChars16(const char16* set);
+    bool replaceChars8(const char* set, char character);
+    bool replaceChars16(const char16* set, char16 character);
+    bool trim(CharGroup group = kGroupSpace);
+    /// Past the end the text grows by spaces; a zero character ends the text there.
+    bool setChar8(unsigned index, char character);
+    bool setChar16(unsigned index, char16 character);
+    /// See the class `ConstString` for the end of a text in digits. Adds one to it, or begins one, separated by
+    /// `separator`, with at least `width` digits and at least `minNumber`. False for a width above 32.
+    bool incrementTrailingNumber(unsigned width = 0, char16 separator = 0, unsigned minNumber = 0);
+
+    // Width, case and form
+    /// In place. Characters that can't be converted become " ", or "?" in the 8-bit form. On failure false.
+    bool toWideString(unsigned encoding = kEncodingDefault);
+    /// A narrow text is taken to be in the default encoding where another one is asked for.
+    bool toMultiByte(unsigned encoding = kEncodingDefault);
+    /// Gives the wide text of these bytes in UTF-8.
+    bool fromUTF8(const char* text);
+    using ConstString::toLower;
+    using ConstString::toUpper;
+    void toLower();
+    void toUpper();
+    void toLower(unsigned index);
+    void toUpper(unsigned index);
+    /// False for narrow text.
+    bool normalize(UnicodeNormalization form);
+
+    // Numbers and formats. At most 4096 characters are kept; in a 16-bit format "%s" means 16-bit text.
+    String& printf(const char* format, ...);
+    String& printf(const char16* format, ...);
+    String& vprintf(const char* format, va_list arguments);
+    String& vprintf(const char16* format, va_list arguments);
+    String& printInt64(int64 value);
+    /// With at least one digit behind the point and no more than six.
+    String& printFloat(double value);
+
+    // Handing over
+    /// False, and empty, for a variant that is no number and no text.
+    bool fromVariant(const FVariant& variant);
+    /// The variant owns the characters thereafter; this text is empty.
+    void passToVariant(FVariant& variant);
+    bool toAttributes(IAttributes* attributes, const char* id) const;
+    bool fromAttributes(IAttributes* attributes, const char* id);
+    /// Adopts a `malloc`ed, terminated text.
+    void take(void* text, bool wide);
+    void take(String& other);
+    /// Gives up the characters: the caller frees them with `free`. May be null.
+    void* pass();
+    void swapContent(String& other);
+    /// After the buffer was written directly.
+    void updateLength();
+    /// The first byte is the length, at most 255; `result` has room for 256 bytes.
+    void toPascalString(unsigned char* result) const;
+    String& fromPascalString(const unsigned char* text);
+
+protected:
+    char* chars8() { return static_cast<char*>(buffer); }
+    char16* chars16() { return static_cast<char16*>(buffer); }
+    using ConstString::chars16;
+    using ConstString::chars8;
+
+private:
+    String& insertAt(unsigned index, const char* text, int count, bool isTerminated);
+    String& insertAt(unsigned index, const char16* text, int count, bool isTerminated);
+};
