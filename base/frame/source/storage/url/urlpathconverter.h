@@ -1,0 +1,22 @@
+#pragma once
+
+#include "foundation/object/cmobject.h"
+
+/// Makes an object of one class from one of another; found through the class factory.
+class IObjectConverter
+{
+public:
+    virtual ~IObjectConverter() = default;
+    virtual bool canConvert(FUnknown* object, const char* className) = 0;
+    /// A new object for the caller; null where it can't be converted.
+    virtual FUnknown* convert(FUnknown* object, const char* className) = 0;
+};
+
+/// Converts between FNPath and FUrl. One thread at a time.
+class UrlPathConverter : public CmObject, public IObjectConverter
+{
+    DECLARE_CLASS(UrlPathConverter, CmObject)
+
+    bool canConvert(FUnknown* object, const char* className) override;
+    FUnknown* convert(FUnknown* object, const char* className) override;
+};
