@@ -1,0 +1,154 @@
+#pragma once
+
+#include "containers/sequence/cmarray.h"
+#include "containers/sequence/cmstack.h"
+#include "containers/value/cmbuffer.h"
+#include "foundation/object/iptr.h"
+
+class FStream;
+class FString;
+class FXmlAttribute;
+
+/// The older parser: a tokenizer over 8-bit text that calls virtual handlers and checks only that tags nest.
+///
+/// A handler may call `process` or `skip` itself, which then reads exactly the element whose start tag it was told
+/// of. The text may lack a root: it is a sequence of elements. It stops at the first error; nesting beyond
+/// `kMaxDepth` is one. One thread at a time.
+class FXmlParser
+{
+public:
+    /// Bits of `setFlags`.
+    enum Flags : uint32
+    {
+        kReportComments = 1,
+        /// A backslash in an attribute value protects the next quote character.
+        kBackslashProtects = 2,
+        /// A comment mark inside a comment sends the text so far to `gotComment`, instead of counting as nested.
+        kSplitComments = 4,
+        /// Tabs and blanks between tokens belong to the data.
+        kKeepSpaces = 8,
+        kStopAfterMainTag = 16,
+        /// A value in which entities gave a byte of 0x80 or more comes in 16 bits.
+        kWidenValues = 32,
+        kWindowsEntities = 64
+    };
+
+    /// What `getNextToken` gives.
+    enum Token
+    {
+        kEndOfData = 0,
+        kMalformed = 1,
+        kStartTag = 2,
+        kEndTag = 3,
+        kEmptyTagEnd = 4,
+        kAttribute = 5,
+        kTagEnd = 6,
+        kData = 7,
+        kLineEnd = 8,
+        kSpace = 9,
+        kInstruction = 10,
+        kInstructionEnd = 11,
+        kComment = 12,
+        kCData = 14,
+        kDocType = 16
+    };
+
+    enum Error
+    {
+        kNoError = 0,
+        kErrorMalformed = 1,
+        kErrorUnexpectedTag = 2,
+        kErrorUnexpectedEnd = 3,
+        kErrorMissingAttributes = 4,
+        kErrorOtherTagExpected = 5
+    };
+
+    /// Takes a reference on the stream. Without `bufferIt` nothing is read ahead, so that whoever stops finds the
+    /// stream right behind the last byte used.
+    FXmlParser(FStream* stream, bool bufferIt);
+    FXmlParser(const FXmlParser&) = delete;
+    FXmlParser& operator=(const FXmlParser&) = delete;
+    virtual ~FXmlParser();
+
+    // What was read, told to the derived class, in slot order. `data` is the argument of `process`. A false result
+    // ends the parsing with `kErrorUnexpectedTag`, unless the handler set another error.
+    /// `attributes` holds FXmlAttribute objects, the parser's own: copy what is to be kept.
+    virtual bool startTag(const char* name, CmContainer& attributes, bool isEmpty, void* data);
+    /// Not called for an empty element.
+    virtual bool endTag(const char* name, void* data);
+    /// One piece of text, not terminated; a count of 0 ends the text.
+    virtual void gotData(void* bytes, unsigned int count, void* data);
+    virtual void gotComment(const char* text, void* data, bool endOfComment);
+
+    /// Reads to the end of the data or, called by a handler, to the end of its element. True where no error is
+    /// pending.
+    bool process(void* data);
+    /// As `process`, calling no handler.
+    bool skip();
+    /// Ends `process` behind the present token; this is no error.
+    void stop() { stopRequested = true; }
+
+    uint32 getFlags() const { return flags; }
+    void setFlags(uint32 bits) { flags = bits; }
+    /// 0 or, after an instruction that says so, 65001 for UTF-8.
+    uint32 getCodePage() const { return codePage; }
+    /// Counted from 1.
+    int32 getLine() const { return line; }
+    int32 getError() const { return error; }
+    /// "" for `kNoError`.
+    const char16* errorMessage() const;
+    /// Tells the line.
+    void getErrorContext(FString& text) const;
+    /// The name of the innermost open element; null outside of all. Borrowed, until the element ends.
+    const char* getCurrentStartTag() const;
+
+    // The input, for handlers that read on their own.
+    FStream* getStream() const { return stream; }
+    /// Begins with another stream: what was read ahead, the open tags, the line and the error are forgotten.
+    void setStream(FStream* newStream);
+    /// The position in the stream of the next byte to be handed out.
+    int64 getStreamPosition() const;
+    /// False at the end of the data.
+    bool nextChar(char& c);
+    /// The byte that `nextChar` will give.
+    bool peekChar(char& c);
+    /// Puts a byte back in front of the data; any number may be put back.
+    void ungetChar(char c);
+    /// Reads one token. `token` holds `kMaxToken` + 1 bytes and is terminated; `size` gets its length.
+    Token getNextToken(char* token, long long* size, bool insideTag);
+
+    /// Decodes the entity references in `text` in place. What isn't known stays as it is. `sawHighBit`, where not
+    /// null, is set (never cleared) when a reference gave a byte of 0x80 or more.
+    ///
+    /// | text                   | result                            |
+    /// |------------------------|-----------------------------------|
+    /// | a&lt;b                 | a<b                               |
+    /// | &#65;&#x41;            | AA                                |
+    /// | &nosuch; &#0; a & b    | the same                          |
+    /// | &eacute;               | the same; byte 0xE9 by `windowsTable` |
+    static void removeEntities(char* text, bool* sawHighBit, bool windowsTable);
+
+    static constexpr int kMaxToken = 4096;
+    static constexpr int kMaxAttributeName = 47;
+    static constexpr int kMaxAttributeValue = 2047;
+    static constexpr int kMaxDepth = 5000;
+
+protected:
+    IPtr<FStream> stream;
+    int32 line = 1;
+    bool skipping = false;
+    bool stopRequested = false;
+    uint32 bufferPos = 0;
+    char lookAhead = 0;
+    int32 error = kNoError;
+    CmBuffer buffer;
+    CmStack tagStack;
+    CmArray attributePool{0, 10};
+    uint32 flags = 0;
+    uint32 codePage = 0;
+
+private:
+    friend class FXmlTokenScan;
+
+    const uint32 blockSize;
+};
