@@ -57,15 +57,15 @@ public:                                                                         
     {                                                                                                        \
         return #Class;                                                                                       \
     }                                                                                                        \
-    bool isA(const char* name) const override                                                                \
+    bool isA(const char* askedName) const override                                                           \
     {                                                                                                        \
-        return Class::isTypeOf(name, false);                                                                 \
+        return Class::isTypeOf(askedName, false);                                                            \
     }                                                                                                        \
-    bool isTypeOf(const char* name, bool askBaseClass) const override                                        \
+    bool isTypeOf(const char* askedName, bool askBaseClass) const override                                   \
     {                                                                                                        \
-        if (name && strcmp(name, #Class) == 0)                                                               \
+        if (askedName && strcmp(askedName, #Class) == 0)                                                     \
             return true;                                                                                     \
-        return askBaseClass && Base::isTypeOf(name, true);                                                   \
+        return askBaseClass && Base::isTypeOf(askedName, true);                                              \
     }
 
 #define DECLARE_COPYABLE(Class, Base)                                                                        \
