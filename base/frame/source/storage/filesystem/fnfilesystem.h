@@ -18,7 +18,7 @@ class FUrl;
 /// main thread.
 class FNFileSystem : public FFileSystem
 {
-    DECLARE_ABSTRACT_CLASS(FNFileSystem, FFileSystem)
+    DECLARE_TYPE(FNFileSystem, FFileSystem)
 
     /// Numbers of `fromPlatformErrorCode`.
     enum Error

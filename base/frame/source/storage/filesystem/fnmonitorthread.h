@@ -1,5 +1,6 @@
 #pragma once
 
+#include "foundation/object/iptr.h"
 #include "foundation/thread/flock.h"
 #include "foundation/thread/fthread.h"
 #include "storage/filesystem/ifilewatcher.h"

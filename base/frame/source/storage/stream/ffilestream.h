@@ -14,7 +14,7 @@ class FNPath;
 /// or the file system's `closeFile`, has given true. One thread at a time.
 class FFileStream : public FStream, public ISizeableStream
 {
-    DECLARE_ABSTRACT_CLASS(FFileStream, FStream)
+    DECLARE_TYPE(FFileStream, FStream)
     FORWARD_FUNKNOWN(FStream)
 
     /// `openFlags` are those of the file system. The stream is closed as yet.

@@ -7,10 +7,11 @@ class FString;
 /// Reads the file that a URL of the protocol "file" names. One thread at a time.
 class FUrlFileHandler : public FUrlHandler
 {
-    DECLARE_ABSTRACT_CLASS(FUrlFileHandler, FUrlHandler)
+    DECLARE_TYPE(FUrlFileHandler, FUrlHandler)
 
     using FUrlHandler::FUrlHandler;
     ~FUrlFileHandler() override;
+    CmObject* newCopy() const override { return nullptr; }
 
     bool open() override;
     bool close() override;

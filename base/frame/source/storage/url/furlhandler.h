@@ -17,7 +17,6 @@ class FUrlHandler : public CmObject
     FUrlHandler(const FUrlHandler&) = delete;
     FUrlHandler& operator=(const FUrlHandler&) = delete;
     ~FUrlHandler() override;
-    CmObject* newCopy() const override { return nullptr; }
 
     virtual bool open() = 0;
     virtual bool close() = 0;
