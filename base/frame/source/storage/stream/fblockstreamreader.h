@@ -1,0 +1,41 @@
+#pragma once
+
+#include "containers/value/cmbuffer.h"
+#include "foundation/object/iptr.h"
+#include "storage/stream/fstream.h"
+
+/// Reads ahead in another stream by blocks, for reading forward in small pieces. Writes nothing.
+///
+/// One thread at a time; nobody else may move the inner stream meanwhile.
+class FBlockStreamReader : public FStream
+{
+    DECLARE_COPYABLE(FBlockStreamReader, FStream)
+
+    FBlockStreamReader(FStream* stream, uint32 blockSize);
+    /// Wraps the same stream, at the other reader's position, with nothing read ahead.
+    FBlockStreamReader(const FBlockStreamReader& other);
+    FBlockStreamReader& operator=(const FBlockStreamReader&) = delete;
+
+    int64 readRaw(void* target, int64 count) override;
+    int64 writeRaw(const void* source, int64 count) override;
+    /// kSeekEnd gives -1.
+    int64 seek(int64 target, FSeekMode mode) override;
+    int64 tell() override { return position; }
+    using FStream::seek;
+    using FStream::tell;
+
+    void rewind() override { seek(0, kSeekStart); }
+    void flush() override;
+
+private:
+    void dropBuffer();
+    int64 takeBuffered(char* target, int64 count);
+    int64 readBlocks(char* target, int64 count);
+    bool fillBuffer();
+
+    IPtr<FStream> stream;
+    CmBuffer buffer;
+    int64 position = 0;
+    int32 bufferOffset = 0;
+    int32 bufferBytes = 0;
+};

@@ -1,0 +1,14 @@
+#pragma once
+
+#include "foundation/object/funknown.h"
+
+/// A stream whose bytes stand in memory.
+class IMemoryStream : public FUnknown
+{
+public:
+    /// The block, which stays the stream's; null where there is none. Valid until the stream grows.
+    virtual char* getData() const = 0;
+    virtual int64 getSize() const = 0;
+
+    DECLARE_INTERFACE_ID
+};
