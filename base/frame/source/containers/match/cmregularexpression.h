@@ -11,8 +11,8 @@
 /// | `?`            | one character or none           |
 /// | `\` and `x`    | the character x itself          |
 ///
-/// Two stars side by side make the pattern invalid; it then matches only the very text that it is. The pattern's
-/// text is changed while it is matched: one object belongs to one thread at a time, matching included.
+/// Two stars side by side make the pattern invalid; it then matches only the very text that it is. A backslash at
+/// the end stands for itself. One thread at a time.
 class CmRegularExpression : public CmObject
 {
     DECLARE_CLASS(CmRegularExpression, CmObject)
@@ -23,9 +23,9 @@ class CmRegularExpression : public CmObject
     CmRegularExpression& operator=(const CmRegularExpression&) = default;
 
     /// Whether the whole text matches. Null is the empty text.
-    bool match(const char16* text);
+    bool match(const char16* text) const;
     /// Whether `text` matches the pattern from its character `patternIndex` on.
-    bool tryString(const char16* text, int patternIndex);
+    bool tryString(const char16* text, int patternIndex) const;
     static bool isValidExpression(const char16* expression);
 
     const char16* getExpression() const { return expression.text16(); }

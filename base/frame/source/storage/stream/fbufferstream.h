@@ -10,7 +10,7 @@ class FBufferStream : public FStream
 {
     DECLARE_COPYABLE(FBufferStream, FStream)
 
-    explicit FBufferStream(CmBuffer& buffer) : buffer(buffer) {}
+    explicit FBufferStream(CmBuffer& target) : buffer(target) {}
 
     int64 readRaw(void* target, int64 count) override;
     int64 writeRaw(const void* source, int64 count) override;
