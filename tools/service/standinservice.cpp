@@ -235,7 +235,7 @@ class StandInService::Listener
 {
 public:
     Listener(State& shared, const ServerIdentity& identity)
-        : state(state_),
+        : state(shared),
           server(identity.certificate.get(), identity.key.get())
     {
         server.set_read_timeout(600);
