@@ -1,0 +1,10 @@
+#pragma once
+
+#include "foundation/object/funknown.h"
+
+/// Identifies the controller of the application to components.
+class IPlatform2 : public FUnknown
+{
+public:
+    DECLARE_INTERFACE_ID
+};
