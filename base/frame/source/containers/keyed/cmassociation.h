@@ -1,0 +1,35 @@
+#pragma once
+
+#include "foundation/object/cmobject.h"
+
+/// A key with its object, as the dictionaries hold it. Equality, order and hash look at the key alone.
+///
+/// It owns neither: the container that holds it does the releasing. A copy shares both. One thread at a time.
+class CmAssociation : public CmObject
+{
+    DECLARE_CLASS(CmAssociation, CmObject)
+
+    CmAssociation() = default;
+    explicit CmAssociation(CmObject* itsKey, CmObject* itsObject = nullptr) : key(itsKey), object(itsObject)
+    {
+    }
+
+    CmObject* getKey() const { return key; }
+    CmObject* getObject() const { return object; }
+    void setKey(CmObject* newKey) { key = newKey; }
+    void setObject(CmObject* newObject) { object = newObject; }
+
+    /// False without a key, as for anything but an association.
+    bool isEqual(const CmObject* other) const override;
+    /// -1 without a key, as for anything but an association.
+    int compare(const CmObject* other) const override;
+    unsigned hash(unsigned size) const override;
+    bool internalize(FArchive& archive) override;
+    bool externalize(FArchive& archive) const override;
+    bool storeAttributes(FAttributes& attributes) const override;
+    bool restoreAttributes(FAttributes& attributes) override;
+
+private:
+    CmObject* key = nullptr;
+    CmObject* object = nullptr;
+};

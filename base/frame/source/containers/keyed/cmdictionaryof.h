@@ -1,0 +1,45 @@
+#pragma once
+
+#include "containers/keyed/cmassociation.h"
+#include "containers/sequence/cmiterator.h"
+
+/// The operations that the three dictionaries share, on the container that holds their associations. It stands
+/// between that container and them, and is no class of the object model.
+///
+/// Keys are unique. In modes 1 and 2 key and object are released when they leave; the association is the
+/// dictionary's own in every mode. Beware: in mode 2 `add` gives key and object no reference, so use modes 0 and 1.
+template <class Container>
+class CmDictionaryOf : public Container
+{
+public:
+    /// False where an equal key is present; the stored pair stays, and the references stay with the caller.
+    bool add(CmObject* key, CmObject* object);
+    /// Takes a CmAssociation under the same test; anything else gives false.
+    bool add(CmObject* association) override;
+    /// Removes the association with an equal key.
+    bool remove(CmObject* key) override;
+    bool remove(const CmIterator& position) override;
+    bool removeAt(int index) override;
+    void removeAll() override;
+    /// Puts another object under the key; the old one leaves. False where the key is absent.
+    bool replace(const CmObject* key, CmObject* newObject);
+
+    /// The object under an equal key, borrowed; null where there is none.
+    CmObject* lookupObject(const CmObject* key) const;
+    CmObject* lookup(const CmObject* key) const override { return lookupObject(key); }
+    CmAssociation* lookupAssoc(const CmObject* key) const;
+    bool contains(const CmObject* key) const override { return lookupAssoc(key) != nullptr; }
+    int occurrences(const CmObject* key) const override;
+
+protected:
+    using Container::Container;
+    CmDictionaryOf() = default;
+    CmDictionaryOf(const CmDictionaryOf&) = delete;
+    ~CmDictionaryOf() override { CmDictionaryOf::removeAll(); }
+
+    bool addFromOther(CmObject* element) override;
+
+private:
+    bool store(CmAssociation* association);
+    void giveUp(CmObject* key, CmObject* object, CmAssociation* association);
+};

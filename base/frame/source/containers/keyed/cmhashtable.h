@@ -1,0 +1,107 @@
+#pragma once
+
+#include "containers/sequence/cmcontainer.h"
+#include "containers/sequence/cmiterator.h"
+
+/// A place in a chain of a CmHashTable.
+struct CmHashNode
+{
+    CmHashNode* next;
+    CmObject* object;
+};
+
+/// A bucket of a CmHashTable: a chain in the order of insertion.
+struct CmHashBucket
+{
+    int count;
+    CmHashNode* first;
+    CmHashNode* last;
+};
+
+/// Chained hash table of objects, by their `hash` and `isEqual`. Duplicates are allowed.
+///
+/// The order of iteration is that of the buckets, and in each the order of insertion; it changes with the number of
+/// buckets. That number stays unless auto-resize is set: then it grows tenfold once the chains are two long on
+/// average. One thread at a time.
+class CmHashTable : public CmContainer
+{
+    DECLARE_CLASS(CmHashTable, CmContainer)
+
+    /// Gives a bucket number below `size`.
+    using HashFunction = unsigned (*)(const CmObject* object, unsigned size);
+
+    /// Without buckets every `add` is refused.
+    explicit CmHashTable(int size = 10);
+    CmHashTable(const CmHashTable& other);
+    CmHashTable& operator=(const CmHashTable& other);
+    ~CmHashTable() override;
+
+    /// Null stands for the `hash` of the elements. Only an empty table may change it.
+    void setHashFunction(HashFunction function) { _hashFunction = function; }
+    void setAutoResize(bool state) { _autoResize = state; }
+    /// Sets the number of buckets. False for none or without memory; the table is then as it was.
+    bool resize(int newSize);
+
+    int total() const override { return _total; }
+    bool add(CmObject* object) override;
+    bool remove(CmObject* object) override;
+    bool remove(const CmIterator& position) override;
+    bool removeAt(int index) override;
+    /// The buckets stay.
+    void removeAll() override;
+    CmObject* lookup(const CmObject* object) const override;
+    bool contains(const CmObject* object) const override { return find(object) != nullptr; }
+    bool containsAbs(const CmObject* object) const override;
+    int occurrences(const CmObject* object) const override;
+    CmIterator* newIterator() const override;
+
+protected:
+    /// An empty table with the settings of `other`, which a derived class then copies.
+    struct SettingsOf
+    {
+        const CmHashTable& other;
+    };
+    explicit CmHashTable(const SettingsOf& settings);
+
+    CmHashNode* find(const CmObject* object) const;
+
+private:
+    friend class CmHashTableIterator;
+
+    CmHashBucket* bucketOf(const CmObject* object) const;
+    unsigned bucketNumber(const CmObject* object, int size) const;
+    void unlink(CmHashBucket& bucket, CmHashNode* node);
+
+    bool _autoResize = false;
+    int32 _total = 0;
+    CmHashBucket* _buckets = nullptr;
+    HashFunction _hashFunction = nullptr;
+};
+
+/// Walks over a CmHashTable. Going backwards costs a walk through a chain.
+class CmHashTableIterator : public CmIterator
+{
+public:
+    explicit CmHashTableIterator(const CmHashTable& walked);
+
+    using CmIterator::next;
+    using CmIterator::previous;
+    bool done() const override { return !node; }
+    CmObject* next() override;
+    CmObject* previous() override;
+    CmObject* current() const override { return node ? node->object : nullptr; }
+    CmObject* first() override;
+    CmObject* last() override;
+
+private:
+    friend class CmHashTable;
+
+    void advance() const;
+    void seekForward() const;
+    void seekBackward() const;
+
+    const CmHashTable& table;
+    // Moved on by a removal, through an iterator that is const to its holder.
+    mutable int bucket = 0;
+    mutable CmHashNode* node = nullptr;
+};
