@@ -1,0 +1,38 @@
+#pragma once
+
+#include "containers/keyed/cmhashtable.h"
+#include "foundation/object/iptr.h"
+#include "storage/attribute/fxmlinstance.h"
+#include "storage/attribute/fxmlreference.h"
+
+#include <vector>
+
+/// Joins references to the objects that they name, once all of a file has been read. One thread at a time.
+class FXmlLinker
+{
+public:
+    FXmlLinker();
+
+    /// Adds a reference. Of two objects with one number the first is found.
+    void addInstance(FXmlInstance* instance);
+    /// `holder` is the object in whose tree the reference stands; null where it stands in none. Both are held until
+    /// the linker goes.
+    void addReference(FXmlReference* reference, FXmlInstance* holder);
+    FXmlInstance* lookup(uint64 id) const;
+    /// Gives each reference its target. One to an unknown number stays empty, which is no error.
+    void link();
+
+private:
+    struct Link
+    {
+        IPtr<FXmlReference> reference;
+        FXmlInstance* holder;
+        FXmlInstance* target;
+    };
+    struct Visit;
+
+    void linkFrom(FXmlInstance* instance, std::vector<Visit>& open);
+
+    CmHashTable instances;
+    std::vector<Link> links;
+};
