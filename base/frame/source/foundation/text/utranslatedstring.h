@@ -1,8 +1,6 @@
 #pragma once
 
-#include "foundation/text/conststringtable.h"
-
-#include <atomic>
+#include "foundation/text/conststring.h"
 
 /// A text for the user: the English literal, which is the key of its translation as well.
 ///
@@ -26,7 +24,7 @@ public:
 
 private:
     const char16* key;
-    mutable std::atomic<const char16*> cached = nullptr;
+    mutable const char16* cached = nullptr;
 
     static Translator translator;
 };

@@ -32,7 +32,7 @@ public:
     void clear();
 
 protected:
-    ~FPreferWorkerThread() override;
+    ~FPreferWorkerThread() override = default;
 
 private:
     struct Record
@@ -41,7 +41,6 @@ private:
         void* data;
     };
 
-    bool enqueue(FWorkClass* work, CmObject* id, void* data);
     Record* takeNext();
     void finishCurrent();
     void cancelCurrent();

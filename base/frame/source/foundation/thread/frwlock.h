@@ -25,7 +25,6 @@ public:
 private:
     bool tryRead();
     bool tryWrite();
-    void wakeReaders();
 
     FCondition canRead;
     FCondition canWrite;

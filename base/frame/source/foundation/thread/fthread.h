@@ -5,7 +5,6 @@
 #include "foundation/thread/platformthread.h"
 
 #include <atomic>
-#include <memory>
 
 class FThread;
 
@@ -40,8 +39,7 @@ protected:
 ///
 /// One object runs one thread at a time, and can be run again after `entry` has returned. Whoever runs it waits for
 /// its end by `waitDead` before deleting it; an object that is deleted earlier leaves its thread to itself.
-/// Everything belongs to one owner, but that any thread may ask `isThreadRunning`, and the thread itself may ask
-/// and set what concerns it.
+/// `run`, `waitDead` and the destructor belong to one owner; all else is thread-safe.
 class FThread
 {
 public:
@@ -87,18 +85,14 @@ public:
     static void setTaskPriorityToForegroundApplication() {}
 
 private:
-    struct Run;
-
     static int callEntry(void* context);
-    void leaveThread();
+    void forgetThread();
 
-    int32 priority = kThreadPriorityNormal;
-    int32 cpuAffinity = -1;
+    std::atomic<int32> priority{kThreadPriorityNormal};
+    std::atomic<int32> cpuAffinity{-1};
     std::atomic<bool> isRunning{false};
-    PlatformThread* handle = nullptr;
+    std::atomic<PlatformThread*> handle{nullptr};
     String name;
-    // What the thread knows of this object, which may go before it.
-    std::shared_ptr<Run> lastRun;
 };
 
 /// Blocks the caller for this many milliseconds, for ever if negative.

@@ -1,3 +1,0 @@
-#include "foundation/text/cmstringwithid.h"
-
-DEFINE_CLASS(CmStringWithId, CmString)

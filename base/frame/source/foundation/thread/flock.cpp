@@ -1,3 +1,0 @@
-#include "foundation/thread/flock.h"
-
-FLock::FLock(const char*) {}

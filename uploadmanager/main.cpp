@@ -1,0 +1,21 @@
+#include "application/iplatformeventhandler.h"
+#include "application/platformservices.h"
+#include "uploadmanager/puploadmanagerapplication.h"
+
+int AppMain()
+{
+    PUploadManagerApplication* application = new PUploadManagerApplication;
+    application->run();
+    application->release();
+    return 0;
+}
+
+int main(int argc, char** argv)
+{
+    Argc = argc;
+    Argv = argv;
+    PlatformServices::raiseLimits();
+    // The platform's side exists before any other object of the framework.
+    IPlatformEventHandler::instance();
+    return AppMain();
+}

@@ -1,0 +1,7 @@
+#include "uploadmanager/uploadrequest.h"
+
+UploadRequest::UploadRequest() : license("all-rights-reserved"), sharing("private")
+{
+    publishers.retainElements();
+    keywords.retainElements();
+}
