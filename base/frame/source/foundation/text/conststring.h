@@ -115,6 +115,7 @@ public:
     }
     int findPrev(int start, char character, CompareMode mode = kCaseSensitive) const;
     int findPrev(int start, char16 character, CompareMode mode = kCaseSensitive) const;
+    int countOccurences(char character, unsigned start = 0, CompareMode mode = kCaseSensitive) const;
     int countOccurences(char16 character, unsigned start = 0, CompareMode mode = kCaseSensitive) const;
 
     // Numbers: read by the standard library's formats from `offset`; with `scanToEnd` from the first place where

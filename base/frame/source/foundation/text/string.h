@@ -55,7 +55,7 @@ public:
     String& append(char character, int count = 1);
     String& append(char16 character, int count = 1);
     String& operator+=(const ConstString& text) { return append(text); }
-    /// Past the end nothing happens.
+    /// Past the end nothing happens, but an empty text takes it at any index.
     String& insertAt(unsigned index, const char* text, int count = -1);
     String& insertAt(unsigned index, const char16* text, int count = -1);
     String& insertAt(unsigned index, const ConstString& text, int count = -1);
@@ -128,13 +128,42 @@ public:
     void toPascalString(unsigned char* result) const;
     String& fromPascalString(const unsigned char* text);
 
-protected:
-    char* chars8() { return static_cast<char*>(buffer); }
-    char16* chars16() { return static_cast<char16*>(buffer); }
+private:
+    template <class Char>
+    Char* chars()
+    {
+        return static_cast<Char*>(buffer);
+    }
     using ConstString::chars16;
     using ConstString::chars8;
+    char* chars8() { return chars<char>(); }
+    char16* chars16() { return chars<char16>(); }
 
-private:
+    bool owns(const void* text) const;
+    void terminate(unsigned index);
+    void fillWith(char character, unsigned index, unsigned count);
+    /// Cuts the text and gives back the room.
+    void shrink(unsigned newLength);
+
+    // What both widths share; where a text is changed in part, it has the width of `Char`.
+    template <class Char>
+    String& assignText(const Char* text, int count, bool isTerminated);
+    template <class Char>
+    String& assignRun(Char character, int count);
+    template <class Char>
+    String& appendRun(Char character, int count);
+    template <class Char>
+    String& splice(unsigned index, unsigned removed, const Char* text, unsigned count);
+    template <class Char>
+    int replaceAll(const Char* from, unsigned fromLength, const Char* to, unsigned toLength, bool all);
+    template <class Char, class Predicate>
+    bool removeIf(Predicate isUnwanted);
+    template <class Char>
+    bool replaceIf(const Char* set, Char character);
+    template <class Char>
+    bool trimText(CharGroup group);
+    template <class Char>
+    bool setCharacter(unsigned index, Char character);
     String& insertAt(unsigned index, const char* text, int count, bool isTerminated);
     String& insertAt(unsigned index, const char16* text, int count, bool isTerminated);
 };

@@ -1,6 +1,8 @@
 #pragma once
 
-#include "foundation/text/conststring.h"
+#include "foundation/text/conststringtable.h"
+
+#include <atomic>
 
 /// A text for the user: the English literal, which is the key of its translation as well.
 ///
@@ -24,7 +26,7 @@ public:
 
 private:
     const char16* key;
-    mutable const char16* cached = nullptr;
+    mutable std::atomic<const char16*> cached = nullptr;
 
     static Translator translator;
 };

@@ -18,8 +18,6 @@ public:
     bool isEmpty();
 
 private:
-    int indexOf(void* id) const;
-
     // Two lists of one length; entries at the same place belong together.
     TDLinkedList<void*> items;
     TDLinkedList<void*> ids;

@@ -32,7 +32,7 @@ public:
     void clear();
 
 protected:
-    ~FPreferWorkerThread() override = default;
+    ~FPreferWorkerThread() override;
 
 private:
     struct Record
@@ -41,6 +41,7 @@ private:
         void* data;
     };
 
+    bool enqueue(FWorkClass* work, CmObject* id, void* data);
     Record* takeNext();
     void finishCurrent();
     void cancelCurrent();

@@ -25,6 +25,7 @@ public:
 private:
     bool tryRead();
     bool tryWrite();
+    void wakeReaders();
 
     FCondition canRead;
     FCondition canWrite;

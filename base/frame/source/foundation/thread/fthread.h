@@ -5,6 +5,7 @@
 #include "foundation/thread/platformthread.h"
 
 #include <atomic>
+#include <memory>
 
 class FThread;
 
@@ -39,7 +40,8 @@ protected:
 ///
 /// One object runs one thread at a time, and can be run again after `entry` has returned. Whoever runs it waits for
 /// its end by `waitDead` before deleting it; an object that is deleted earlier leaves its thread to itself.
-/// `run`, `waitDead` and the destructor belong to one owner; all else is thread-safe.
+/// Everything belongs to one owner, but that any thread may ask `isThreadRunning`, and the thread itself may ask
+/// and set what concerns it.
 class FThread
 {
 public:
@@ -85,14 +87,18 @@ public:
     static void setTaskPriorityToForegroundApplication() {}
 
 private:
-    static int callEntry(void* context);
-    void forgetThread();
+    struct Run;
 
-    std::atomic<int32> priority{kThreadPriorityNormal};
-    std::atomic<int32> cpuAffinity{-1};
+    static int callEntry(void* context);
+    void leaveThread();
+
+    int32 priority = kThreadPriorityNormal;
+    int32 cpuAffinity = -1;
     std::atomic<bool> isRunning{false};
-    std::atomic<PlatformThread*> handle{nullptr};
+    PlatformThread* handle = nullptr;
     String name;
+    // What the thread knows of this object, which may go before it.
+    std::shared_ptr<Run> lastRun;
 };
 
 /// Blocks the caller for this many milliseconds, for ever if negative.

@@ -19,7 +19,7 @@ public:
     /// Makes a thread that waits for `resume` before it calls `body`. Gives 0, or the system's error code and a null
     /// `result`.
     static int createSuspended(Body body, void* context, PlatformThread*& result);
-    /// A record that stands for the calling thread; `join` fails on it.
+    /// A record that stands for the calling thread; `join` fails on it and `cancel` does nothing.
     static PlatformThread* adoptCurrent();
 
     static FThreadID currentID();

@@ -1,0 +1,3 @@
+#include "foundation/text/cmstringwithid.h"
+
+DEFINE_CLASS(CmStringWithId, CmString)

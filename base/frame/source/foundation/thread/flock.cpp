@@ -1,0 +1,3 @@
+#include "foundation/thread/flock.h"
+
+FLock::FLock(const char*) {}
