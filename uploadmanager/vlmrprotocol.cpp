@@ -2,29 +2,11 @@
 
 #include "application/urlscheme.h"
 #include "foundation/object/iptr.h"
-#include "storage/path/fnpath.h"
 #include "uploadmanager/puploadmanagerapplication.h"
+#include "uploadmanager/urlaspath.h"
 
 namespace
 {
-// A URL travels as a path, whole: taken apart as one it would lose a trailing delimiter, of a token perhaps, and have
-// its backslashes turned.
-class UrlAsPath : public FNPath
-{
-    DECLARE_COPYABLE(UrlAsPath, FNPath)
-
-    explicit UrlAsPath(const char* text) { url.fromUTF8(text); }
-
-    bool getFullPath(FString& result) const override
-    {
-        result = url;
-        return !url.isEmpty();
-    }
-
-private:
-    FString url;
-};
-
 class VlmrUrlHandler final : public IURLSchemeHandler
 {
 public:
