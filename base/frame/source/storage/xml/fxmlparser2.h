@@ -48,16 +48,17 @@ private:
     };
 
     void install();
-    Outcome parseBlock(IBStream* stream);
-    Outcome judge(int status, IBStream* stream);
-    bool isTokenTooLong(int64 bytesFed) const;
+    Outcome parseBlock(IBStream& stream);
+    Outcome judge(int status, IBStream& stream);
+    bool isTokenTooLong() const;
     int errorCode() const;
-    void countDepth(int change);
 
     XML_ParserStruct* parser;
     IPtr<INewXmlHandler> handler;
+    /// Where in the stream the document begins; -1 before it has begun.
     int64 documentStart = -1;
     int64 bytesFed = 0;
     int depth = 0;
+    /// A token was too long.
     bool refused = false;
 };

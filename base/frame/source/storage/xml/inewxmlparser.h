@@ -26,7 +26,7 @@ public:
     virtual bool setEncoding(const char* encoding) = 0;
     /// The reason and the line of the last failure, for the user. False where there was none to tell.
     virtual bool getErrorContext(IStringResult& text) = 0;
-    /// Counted from 1.
+    /// Counted from 1, but from 0 when the parser was stopped.
     virtual int64 getCurrentLineNumber() = 0;
 
     DECLARE_INTERFACE_ID

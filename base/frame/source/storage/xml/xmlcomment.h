@@ -13,6 +13,8 @@ class Comment : public Node
     explicit Comment(const ConstString& text);
 
 protected:
+    friend class DocumentParser;
+
     void print(Buffer& out) const override;
 };
 } // namespace Xml

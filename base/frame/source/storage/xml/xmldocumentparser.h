@@ -27,8 +27,8 @@ class DocumentParser : public XmlHandler
     void comment(INewXmlParser* from, const char* text) override;
 
 private:
-    void addAttributes(Element& element, const char** attributes);
-    void addToCurrent(Node* node);
+    void addAttributes(INewXmlParser* from, Element& element, const char** attributes);
+    /// Stops the parser once the tree is too large.
     void charge(INewXmlParser* from, size_t bytes);
 
     IPtr<FXmlParser2> parser;

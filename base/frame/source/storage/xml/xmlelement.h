@@ -69,9 +69,11 @@ private:
     bool canAdopt(Node* child) const;
     void linkBefore(Node* child, Node* place);
     void unlink(Node* child);
+    void insertLayout(Node* place, int tabs);
     void reformatChildren(int depth);
     void printStart(Buffer& out) const;
     void printEnd(Buffer& out) const;
+    bool printTree(Buffer& out, IBStream* stream) const;
     void takeChildrenOf(Element& other);
     void dropChildren();
 

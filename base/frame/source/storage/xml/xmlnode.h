@@ -47,7 +47,15 @@ protected:
 
     /// Appends the node's text to `out`.
     virtual void print(Buffer& out) const = 0;
+    /// Writes and empties the buffer.
+    static bool writeBuffer(Buffer& out, IBStream& stream);
+    static Element* findElement(Node* from, const char16* elementName);
 
+private:
+    /// Whether the node stands in an element.
+    bool linked = false;
+
+protected:
     FString name;
 
 private:

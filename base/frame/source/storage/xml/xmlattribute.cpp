@@ -1,0 +1,26 @@
+#include "storage/xml/xmlattribute.h"
+
+#include "containers/value/buffer.h"
+#include "storage/xml/fxmlwriter.h"
+
+namespace Xml
+{
+Attribute::Attribute(const ConstString& attributeName, const ConstString& text) : Node(attributeName), value(text)
+{
+    value.toWideString();
+}
+
+void Attribute::setValue(const ConstString& text)
+{
+    value = text;
+    value.toWideString();
+}
+
+void Attribute::print(Buffer& out) const
+{
+    FXmlWriter::encodeString(out, name.text16());
+    out.put("=\"", 2);
+    FXmlWriter::encodeString(out, value.text16());
+    out.put('"');
+}
+} // namespace Xml

@@ -1,0 +1,101 @@
+#include "storage/xml/xmldocumentparser.h"
+
+#include "storage/xml/xmlcomment.h"
+#include "storage/xml/xmlelementdata.h"
+#include "storage/xml/xmltext.h"
+
+#include <cstring>
+
+namespace Xml
+{
+namespace
+{
+/// What a small block of memory costs beyond its bytes.
+constexpr size_t kBlockCost = 16;
+
+size_t wideCost(const char* text)
+{
+    return 2 * (strlen(text) + 1) + kBlockCost;
+}
+} // namespace
+
+DocumentParser::DocumentParser() : parser(adopt(new FXmlParser2)) {}
+
+DocumentParser::~DocumentParser() = default;
+
+bool DocumentParser::parse(IBStream* stream, int64 maxTreeBytes)
+{
+    bytesLeft = maxTreeBytes;
+    // Only for the time of the parsing: two objects that hold each other would stay forever.
+    parser->setHandler(this);
+    const bool done = parser->process(stream);
+    parser->setHandler(nullptr);
+    return done && bytesLeft >= 0;
+}
+
+void DocumentParser::startTag(INewXmlParser* from, const char* tag, const char** attributes)
+{
+    if (finished)
+        return;
+    charge(from, sizeof(Element) + kBlockCost + wideCost(tag));
+    auto* element = new Element(ConstString(), current);
+    assignUtf8(element->name, tag);
+    addAttributes(from, *element, attributes);
+    if (current)
+        current->linkBefore(element, nullptr);
+    else
+        root = adopt<Node>(element);
+    current = element;
+}
+
+void DocumentParser::addAttributes(INewXmlParser* from, Element& element, const char** attributes)
+{
+    int count = 0;
+    while (attributes[count])
+        count++;
+    element.attributes.resize(count / 2);
+    for (int i = 0; i + 1 < count; i += 2)
+    {
+        charge(from, sizeof(Attribute) + kBlockCost + wideCost(attributes[i]) + wideCost(attributes[i + 1]));
+        IPtr<Attribute> attribute = adopt(new Attribute);
+        assignUtf8(attribute->name, attributes[i]);
+        assignUtf8(attribute->value, attributes[i + 1]);
+        element.attributes.add(attribute);
+    }
+}
+
+void DocumentParser::endTag(INewXmlParser*, const char*)
+{
+    if (finished || !current)
+        return;
+    Node* parent = current->parent;
+    current = parent ? parent->asElement() : nullptr;
+    finished = current == nullptr;
+}
+
+// No piece is joined with its neighbour: what reads the text relies on seeing the pieces.
+void DocumentParser::charData(INewXmlParser* from, const char* data, int length)
+{
+    if (finished || !current)
+        return;
+    charge(from, sizeof(ElementData) + 2 * kBlockCost + static_cast<size_t>(length));
+    current->linkBefore(new ElementData(data, length), nullptr);
+}
+
+void DocumentParser::comment(INewXmlParser* from, const char* text)
+{
+    if (finished || !current)
+        return;
+    charge(from, sizeof(Comment) + kBlockCost + wideCost(text));
+    auto* node = new Comment(ConstString());
+    assignUtf8(node->name, text);
+    current->linkBefore(node, nullptr);
+}
+
+void DocumentParser::charge(INewXmlParser* from, size_t bytes)
+{
+    bytesLeft -= static_cast<int64>(bytes);
+    if (bytesLeft < 0)
+        from->stop();
+}
+} // namespace Xml

@@ -1,0 +1,24 @@
+#pragma once
+
+#include "foundation/text/string.h"
+
+class Buffer;
+
+namespace Xml
+{
+/// Gives `target` the wide text of `length` bytes in UTF-8; plain ASCII, by far the most, skips the converter.
+void assignUtf8(String& target, const char* text, size_t length);
+void assignUtf8(String& target, const char* text);
+
+/// Whether the bytes are tabs, line ends and blanks alone.
+bool isXmlSpace(const char* text, size_t length);
+inline bool isXmlSpace(char c)
+{
+    return c == ' ' || c == '\n' || c == '\r' || c == '\t';
+}
+
+/// Appends the text in UTF-8, without a terminator and without entities.
+void appendUtf8(Buffer& out, const char16* text);
+/// Appends an 8-bit text as it stands, without its terminator.
+void appendText(Buffer& out, const char* text);
+} // namespace Xml
