@@ -143,12 +143,67 @@ protected:
     int32 error = kNoError;
     CmBuffer buffer;
     CmStack tagStack;
+    /// Objects for reuse, each with one reference.
     CmArray attributePool{0, 10};
     uint32 flags = 0;
     uint32 codePage = 0;
 
 private:
-    friend class FXmlTokenScan;
+    /// How far a run of bytes went: to the byte that ends it, to the end of the data, or to the token's limit.
+    enum class Run
+    {
+        kStopped,
+        kEnded,
+        kFull
+    };
+    struct TokenText;
+
+    // Bytes: `lookAhead` is empty while these work
+    bool refill();
+    bool hasByte() { return bufferPos < buffer.getFillSize() || refill(); }
+    bool hasBytes(uint32 count);
+    char frontByte() const { return buffer.ptr()[bufferPos]; }
+    bool startsWith(const char* text, uint32 length);
+    void pushFront(char c);
+    void settleLookAhead();
+    template <class Predicate>
+    Run copyUntil(TokenText& token, Predicate ends);
+    void skipSpace();
+    void countLines(const char* text, size_t length);
+
+    // Tokens
+    Token readToken(TokenText& token, bool insideTag);
+    Token readTagPart(TokenText& token);
+    Token readMarkup(TokenText& token);
+    Token readAttribute(TokenText& token);
+    Token readLineEnd(TokenText& token);
+    Token readData(TokenText& token);
+    Token readDeclaration(TokenText& token);
+    Token readEndTag(TokenText& token);
+    bool endsData();
+
+    // Tokens to handlers
+    bool processToken(int startDepth, void* data);
+    bool isElementDone(int startDepth) const;
+    void handleStartTag(void* data);
+    bool readAttributes(CmArray& attributes, Token& ending);
+    void tellStartTag(CmArray& attributes, bool isEmpty, void* data);
+    void handleEndTag(void* data);
+    void handleData(int64 size, void* data);
+    void handlePI();
+    void handleComment(void* data);
+    void skipComment();
+    void readComment(bool report, void* data);
+    void skipCData();
+    void skipDocType();
+    bool skipPast(const char* end);
+    void tellComment(TokenText& text, bool report, void* data, bool endOfComment);
+    FXmlAttribute* tokenToAttribute(char* token, int64 size);
+    FXmlAttribute* takeAttribute();
+    void recycle(CmArray& attributes);
+    void fail(Error code);
 
     const uint32 blockSize;
+    Buffer tokenBuffer;
+    Buffer tagName;
 };

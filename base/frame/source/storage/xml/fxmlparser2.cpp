@@ -50,7 +50,8 @@ struct FXmlParser2::Callbacks
 };
 
 FXmlParser2::FXmlParser2(INewXmlHandler* newHandler, const char* encoding)
-    : parser(XML_ParserCreate(encoding)), handler(newHandler)
+    : parser(XML_ParserCreate(encoding)),
+      handler(newHandler)
 {
     install();
 }

@@ -25,7 +25,7 @@ public:
     static constexpr int kMaxEntityName = 10;
 
 private:
-    bool takeEntity(const char*& from, const char* end, char& result) const;
+    void takeEntity(const char*& from, const char* end, char& result) const;
 
     uint32 options;
     bool windowsTable;

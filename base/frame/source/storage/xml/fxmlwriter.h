@@ -53,7 +53,7 @@ public:
     static void encodeString(Buffer& out, const char* text, bool utf8);
 
 private:
-    int32 beginLine(const char* name);
+    void beginLine(const char* name);
     void appendAttribute(const char* name, const char* value);
     int32 finishStartTag(const char* name, bool isEmpty);
     int32 flushLine(int indent);

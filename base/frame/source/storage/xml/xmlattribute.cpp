@@ -5,7 +5,9 @@
 
 namespace Xml
 {
-Attribute::Attribute(const ConstString& attributeName, const ConstString& text) : Node(attributeName), value(text)
+Attribute::Attribute(const ConstString& attributeName, const ConstString& text)
+    : Node(attributeName),
+      value(text)
 {
     value.toWideString();
 }

@@ -17,6 +17,7 @@ class Attribute : public Node
 
 protected:
     friend class DocumentParser;
+    friend class Element;
 
     void print(Buffer& out) const override;
 

@@ -15,7 +15,9 @@ constexpr uint32 kWriteBlock = 32768;
 } // namespace
 
 Element::Element(const ConstString& elementName, Node* elementParent)
-    : Node(elementName), parent(elementParent), attributes(0, 4)
+    : Node(elementName),
+      parent(elementParent),
+      attributes(0, 4)
 {
 }
 
@@ -80,8 +82,8 @@ bool Element::canAdopt(Node* child) const
     {
         if (ancestor == element)
             return false;
-        Element* next = ancestor->asElement();
-        ancestor = next ? next->parent : nullptr;
+        Element* outer = ancestor->asElement();
+        ancestor = outer ? outer->parent : nullptr;
     }
     return true;
 }

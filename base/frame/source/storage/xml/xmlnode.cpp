@@ -48,7 +48,8 @@ bool Node::writeBuffer(Buffer& out, IBStream& stream)
 {
     const auto count = static_cast<int>(out.getFillSize());
     int written = 0;
-    const bool done = count == 0 || (stream.write(out.ptr(), count, &written) == kResultOk && written == count);
+    const bool done =
+        count == 0 || (stream.write(out.ptr(), count, &written) == kResultOk && written == count);
     out.flush();
     return done;
 }

@@ -17,18 +17,10 @@ bool isAscii(const char* text, size_t length)
     return bits < 0x80;
 }
 
-size_t asciiRun(const char16* text)
+size_t runLength(std::u16string_view text, bool ascii)
 {
     size_t length = 0;
-    while (text[length] != 0 && text[length] < 0x80)
-        length++;
-    return length;
-}
-
-size_t otherRun(const char16* text)
-{
-    size_t length = 0;
-    while (text[length] >= 0x80)
+    while (length < text.size() && (text[length] < 0x80) == ascii)
         length++;
     return length;
 }
@@ -49,8 +41,8 @@ void appendAscii(Buffer& out, const char16* text, size_t length)
 void appendConverted(Buffer& out, const char16* text, size_t length)
 {
     unsigned bytes = 0;
-    char* converted = ITextServices::instance().toMultiByte(text, static_cast<unsigned>(length), kEncodingUtf8,
-                                                            '?', bytes);
+    char* converted =
+        ITextServices::instance().toMultiByte(text, static_cast<unsigned>(length), kEncodingUtf8, '?', bytes);
     if (converted)
         out.put(converted, bytes);
     free(converted);
@@ -61,7 +53,8 @@ namespace Xml
 {
 void assignUtf8(String& target, const char* text, size_t length)
 {
-    char16* wide = isAscii(text, length) ? static_cast<char16*>(malloc((length + 1) * sizeof(char16))) : nullptr;
+    char16* wide =
+        isAscii(text, length) ? static_cast<char16*>(malloc((length + 1) * sizeof(char16))) : nullptr;
     if (!wide)
     {
         target.assign(text, static_cast<int>(length), false);
@@ -84,17 +77,17 @@ bool isXmlSpace(const char* text, size_t length)
     return std::all_of(text, text + length, [](char c) { return isXmlSpace(c); });
 }
 
-void appendUtf8(Buffer& out, const char16* text)
+void appendUtf8(Buffer& out, std::u16string_view text)
 {
-    while (*text)
+    while (!text.empty())
     {
-        const size_t ascii = asciiRun(text);
-        appendAscii(out, text, ascii);
-        text += ascii;
-        const size_t others = otherRun(text);
-        if (others > 0)
-            appendConverted(out, text, others);
-        text += others;
+        const bool ascii = text[0] < 0x80;
+        const size_t length = runLength(text, ascii);
+        if (ascii)
+            appendAscii(out, text.data(), length);
+        else
+            appendConverted(out, text.data(), length);
+        text.remove_prefix(length);
     }
 }
 

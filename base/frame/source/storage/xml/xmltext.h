@@ -2,6 +2,8 @@
 
 #include "foundation/text/string.h"
 
+#include <string_view>
+
 class Buffer;
 
 namespace Xml
@@ -18,7 +20,7 @@ inline bool isXmlSpace(char c)
 }
 
 /// Appends the text in UTF-8, without a terminator and without entities.
-void appendUtf8(Buffer& out, const char16* text);
+void appendUtf8(Buffer& out, std::u16string_view text);
 /// Appends an 8-bit text as it stands, without its terminator.
 void appendText(Buffer& out, const char* text);
 } // namespace Xml
