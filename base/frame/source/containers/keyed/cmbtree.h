@@ -48,13 +48,13 @@ private:
     int minimum() const;
     bool isFull(const CmBTreeNode* node) const { return node->count == _order - 1; }
     CmBTreeNode* leafFor(const CmObject* object) const;
-    CmBTreeNode* makeSpareNodes(const CmBTreeNode* leaf) const;
-    CmBTreeNode* split(CmBTreeNode* node, CmBTreeNode* right, CmObject*& separator) const;
+    bool makeSpareNodes(const CmBTreeNode* leaf, CmBTreeNode*& spares) const;
     void insertUpwards(CmBTreeNode* leaf, CmObject* object, CmBTreeNode* spares);
+    CmObject* split(CmBTreeNode* node, CmBTreeNode* right) const;
     CmObject* detach(CmBTreeNode* node, int index);
     void repair(CmBTreeNode* node);
-    bool takeFromRight(CmBTreeNode* node, int index);
-    bool takeFromLeft(CmBTreeNode* node, int index);
+    bool joinWithRight(CmBTreeNode* node, int index);
+    bool joinWithLeft(CmBTreeNode* node, int index);
     void dropEmptyRoot();
     void removeNodes(CmBTreeNode* node);
 
@@ -80,8 +80,9 @@ public:
 private:
     friend class CmBTree;
 
-    void setTo(CmBTreeNode* place, int placeIndex) const;
+    void seek(const CmObject* object) const;
     void advance() const;
+    void retreat();
 
     const CmBTree& tree;
     // Set anew by a removal, through an iterator that is const to its holder.

@@ -40,6 +40,20 @@ protected:
     bool addFromOther(CmObject* element) override;
 
 private:
-    bool store(CmAssociation* association);
-    void giveUp(CmObject* key, CmObject* object, CmAssociation* association);
+    /// What an association holds, kept beyond its end.
+    struct Pair
+    {
+        explicit Pair(CmObject* element)
+            : association(static_cast<CmAssociation*>(element)),
+              key(association->getKey()),
+              object(association->getObject())
+        {
+        }
+
+        CmAssociation* association;
+        CmObject* key;
+        CmObject* object;
+    };
+
+    void giveUp(const Pair& pair);
 };

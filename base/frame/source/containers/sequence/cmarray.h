@@ -52,8 +52,6 @@ class CmArray : public CmContainer
     /// Sets the number of places; surplus elements are removed. False only without memory.
     virtual bool resize(int newSize);
 
-    CmObject* operator[](int index) const { return at(index); }
-
 private:
     bool isIndex(int index) const { return index >= 0 && index < _total; }
     void detachAt(int index);

@@ -40,8 +40,6 @@ class CmOrderedArray : public CmContainer
     virtual void resort();
     virtual bool resize(int newSize);
 
-    CmObject* operator[](int index) const { return at(index); }
-
 private:
     bool isIndex(int index) const { return index >= 0 && index < _total; }
     void detachAt(int index);

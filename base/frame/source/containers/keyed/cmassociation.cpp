@@ -1,0 +1,20 @@
+#include "containers/keyed/cmassociation.h"
+
+DEFINE_CLASS(CmAssociation, CmObject)
+
+bool CmAssociation::isEqual(const CmObject* other) const
+{
+    const CmAssociation* association = FCast(CmAssociation, other);
+    return association && key && key->isEqual(association->key);
+}
+
+int CmAssociation::compare(const CmObject* other) const
+{
+    const CmAssociation* association = FCast(CmAssociation, other);
+    return association && key ? key->compare(association->key) : -1;
+}
+
+unsigned CmAssociation::hash(unsigned size) const
+{
+    return key ? key->hash(size) : CmObject::hash(size);
+}

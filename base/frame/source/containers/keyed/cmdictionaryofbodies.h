@@ -1,0 +1,146 @@
+#pragma once
+
+#include "containers/keyed/cmdictionaryof.h"
+#include "containers/sequence/cmcontainer.h"
+
+#include <memory>
+#include <utility>
+
+// The bodies of CmDictionaryOf, for the sources that instantiate it.
+
+template <class Container>
+bool CmDictionaryOf<Container>::add(CmObject* key, CmObject* object)
+{
+    auto* association = new CmAssociation(key, object);
+    const bool isAdded = add(association);
+    // In mode 2 the container holds a reference of its own.
+    if (!isAdded || this->_ownsObjects == CmContainer::kRetained)
+        association->release();
+    return isAdded;
+}
+
+template <class Container>
+bool CmDictionaryOf<Container>::add(CmObject* object)
+{
+    const CmAssociation* association = FCast(CmAssociation, object);
+    if (!association || !association->getKey() || lookupAssoc(association->getKey()))
+        return false;
+    return Container::add(object);
+}
+
+template <class Container>
+bool CmDictionaryOf<Container>::remove(CmObject* key)
+{
+    CmAssociation* association = lookupAssoc(key);
+    if (!association)
+        return false;
+    const Pair pair(association);
+    CmAssociation probe(key);
+    Container::remove(&probe);
+    giveUp(pair);
+    return true;
+}
+
+template <class Container>
+bool CmDictionaryOf<Container>::remove(const CmIterator& position)
+{
+    if (!position.walksOver(this) || position.done())
+        return false;
+    const Pair pair(position.current());
+    Container::remove(position);
+    giveUp(pair);
+    return true;
+}
+
+template <class Container>
+bool CmDictionaryOf<Container>::removeAt(int index)
+{
+    CmObject* association = this->at(index);
+    if (!association)
+        return false;
+    const Pair pair(association);
+    Container::removeAt(index);
+    giveUp(pair);
+    return true;
+}
+
+template <class Container>
+void CmDictionaryOf<Container>::removeAll()
+{
+    for (std::unique_ptr<CmIterator> it(this->newIterator()); !it->done();)
+        giveUp(Pair(it->next()));
+    Container::removeAll();
+}
+
+template <class Container>
+bool CmDictionaryOf<Container>::replace(const CmObject* key, CmObject* newObject)
+{
+    CmAssociation* association = lookupAssoc(key);
+    if (!association)
+        return false;
+    CmObject* replaced = association->getObject();
+    // An object that takes its own place must not be released for it.
+    if (replaced == newObject)
+        return true;
+    association->setObject(newObject);
+    this->testDelete(replaced);
+    return true;
+}
+
+template <class Container>
+CmObject* CmDictionaryOf<Container>::lookupObject(const CmObject* key) const
+{
+    const CmAssociation* association = lookupAssoc(key);
+    return association ? association->getObject() : nullptr;
+}
+
+template <class Container>
+CmAssociation* CmDictionaryOf<Container>::lookupAssoc(const CmObject* key) const
+{
+    if (!key)
+        return nullptr;
+    const CmAssociation probe(const_cast<CmObject*>(key));
+    return static_cast<CmAssociation*>(Container::lookup(&probe));
+}
+
+template <class Container>
+int CmDictionaryOf<Container>::occurrences(const CmObject* key) const
+{
+    return lookupAssoc(key) ? 1 : 0;
+}
+
+template <class Container>
+bool CmDictionaryOf<Container>::addFromOther(CmObject* element)
+{
+    // An association belongs to one dictionary, so each gets its own.
+    const CmAssociation* association = FCast(CmAssociation, element);
+    if (!association)
+        return false;
+    CmObject* key = association->getKey();
+    CmObject* object = association->getObject();
+    const int16 mode = this->_ownsObjects;
+    if (mode == CmContainer::kTaken)
+    {
+        key = key ? key->newCopy() : nullptr;
+        object = object ? object->newCopy() : nullptr;
+    }
+    const bool isAdded = add(key, object);
+    for (CmObject* member : {key, object})
+    {
+        if (member && isAdded && mode == CmContainer::kRetained)
+            member->addRef();
+        if (member && !isAdded && mode == CmContainer::kTaken)
+            member->release();
+    }
+    return isAdded;
+}
+
+// What an association that has left held; in mode 0 the association itself is still to be released.
+template <class Container>
+void CmDictionaryOf<Container>::giveUp(const Pair& pair)
+{
+    this->testDelete(pair.key);
+    this->testDelete(pair.object);
+    if (this->_ownsObjects == CmContainer::kShared)
+        pair.association->release();
+}

@@ -1,0 +1,3 @@
+#include "containers/sequence/cmqueue.h"
+
+DEFINE_CLASS(CmQueue, CmLinkedList)

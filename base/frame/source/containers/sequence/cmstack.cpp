@@ -1,0 +1,3 @@
+#include "containers/sequence/cmstack.h"
+
+DEFINE_CLASS(CmStack, CmLinkedList)
