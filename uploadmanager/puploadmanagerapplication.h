@@ -103,6 +103,9 @@ class PUploadManagerApplication : public UApplication
     void checkDeleteXmlFile();
 
 private:
+    /// Lets tests look at the stores and the queue.
+    friend struct ApplicationProbe;
+
     void addProducts();
     void loadTokens();
 

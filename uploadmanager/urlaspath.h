@@ -1,5 +1,6 @@
 #pragma once
 
+#include "storage/path/filenametext.h"
 #include "storage/path/fnpath.h"
 
 /// A URL that travels as a path, whole: taken apart as one it would lose a trailing delimiter, of a token perhaps, and
@@ -8,8 +9,8 @@ class UrlAsPath : public FNPath
 {
     DECLARE_COPYABLE(UrlAsPath, FNPath)
 
-    /// `text` is UTF-8.
-    explicit UrlAsPath(const char* text) { url.fromUTF8(text); }
+    /// `bytes` as the desktop gave them.
+    explicit UrlAsPath(const char* bytes) { FileNameText::fromBytes(bytes, url); }
 
     bool getFullPath(FString& result) const override
     {
