@@ -31,6 +31,10 @@ if(CMAKE_BUILD_TYPE STREQUAL "Debug")
 endif()
 target_link_libraries(house_options INTERFACE Threads::Threads)
 
+if(VELLAMOOR_PARTIAL_LINK)
+  # A position-independent program can't refer to data that isn't there.
+  add_link_options(-no-pie)
+endif()
 find_program(LLD ld.lld)
 if(LLD)
   add_link_options(-fuse-ld=lld)
