@@ -135,7 +135,7 @@ SampleDescription::Elements everyElement(const std::string& audio, const std::st
             {"ReleaseDay", "14"},
             {"MediaLicense", "all-rights-reserved"},
             {"UrlPurchase", "https://shop.example:8443/evening"},
-            {"UrlVideo", "http://video.example/watch"},
+            {"UrlVideo", "http://video.example:8080/watch"},
             {"Commentable", "false"},
             {"Sharing", "public"},
             {"Streamable", "false"},

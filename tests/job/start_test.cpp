@@ -1,0 +1,118 @@
+#include "tests/job/job.h"
+
+namespace
+{
+
+constexpr const char* kCannotStart = "You cannot start the Vellamoor Upload Manager directly.";
+
+class Start : public Job
+{
+protected:
+    /// What the shipped translation has for an English text; empty if there is none.
+    static std::string translation(const std::string& english, const std::string& code)
+    {
+        const std::string table = contentsOf(std::string(JOB_RESOURCES) + "/translation.xml");
+        const std::size_t entry = table.find("Key=\"" + english + "\"");
+        const std::size_t begin = table.find("<" + code + ">", entry) + code.size() + 2;
+        return entry == std::string::npos ? "" : table.substr(begin, table.find("</", begin) - begin);
+    }
+};
+
+} // namespace
+
+TEST_F(Start, WithoutAFileSaysSoAndEnds)
+{
+    EXPECT_EQ(run({}), std::string(kCannotStart) + "\n");
+    EXPECT_TRUE(service->received().empty());
+}
+
+TEST_F(Start, WithoutAFileSaysSoInTheLanguageOfTheUser)
+{
+    for (const auto& [locale, code] : {std::pair("de_DE.UTF-8", "de"), std::pair("fr_FR.UTF-8", "fr"),
+                                       std::pair("ja_JP.UTF-8", "jp"), std::pair("es_ES.UTF-8", "es")})
+    {
+        setVariable("LANG", locale);
+        const std::string expected = translation(kCannotStart, code);
+        EXPECT_GT(expected.size(), 20u) << code;
+        EXPECT_EQ(run({}), expected + "\n") << locale;
+    }
+}
+
+TEST_F(Start, SpeaksTheLanguageOfTheDescriptionAndRemembersIt)
+{
+    logIn();
+    SampleDescription description = minimal();
+    description.language("de");
+    const std::string printed = run({writeDescription(description)});
+    EXPECT_HOLDS(printed, translation("Uploading audio file(s) to SoundCloud...", "de"));
+    EXPECT_EQ(contentsOf(userFile("language")), attributeFile("language", {{"language", "de"}}));
+
+    SampleDescription unknown("Nobody");
+    unknown.language("xx").track({{"Path", tone()}});
+    const std::string later = run({writeDescription(unknown)});
+    EXPECT_LACKS(later, "Internal program error.");
+    EXPECT_HOLDS(later, "16");
+    EXPECT_EQ(contentsOf(userFile("language")), attributeFile("language", {{"language", "de"}}));
+}
+
+TEST_F(Start, OfASecondProcessAddsToTheUploadsOfTheFirst)
+{
+    logIn();
+    service->plan("/tracks stall 0");
+    const std::string firstFile = writeDescription(minimal(), "first.xml");
+    Run first = start({firstFile});
+    ASSERT_TRUE(service->waitForStalled(1, kHangs));
+    ASSERT_TRUE(first.process->waitForOutput("(1 of 1)"));
+
+    const std::string secondFile = writeDescription(minimal(), "second.xml");
+    EXPECT_EQ(run({"second.xml"}), "") << "the second start hands over and ends";
+    EXPECT_TRUE(first.process->waitForOutput("(1 of 2)"));
+    EXPECT_FALSE(exists(firstFile)) << "it was let go when the second came";
+    service->release();
+    first.finish();
+
+    EXPECT_EQ(received("/tracks").size(), 2u);
+    EXPECT_FALSE(exists(secondFile));
+}
+
+TEST_F(Start, OfASecondProcessForAnotherProductIsRefused)
+{
+    logIn();
+    service->plan("/tracks stall 0");
+    Run first = start({writeDescription(minimal(), "first.xml")});
+    ASSERT_TRUE(service->waitForStalled(1, kHangs));
+
+    const std::string secondFile = writeDescription(minimal("Plenar"), "second.xml");
+    run({secondFile});
+    EXPECT_TRUE(first.process->waitForOutput(
+        "You cannot upload tracks from 2 different Vellamoor applications at the same time.\n"
+        "Please wait until the current upload has finished."));
+    EXPECT_TRUE(exists(secondFile));
+    service->release();
+    first.finish();
+
+    EXPECT_EQ(received("/tracks").size(), 1u);
+    EXPECT_FALSE(exists(secondFile)) << "it is the file in hand when the run ends";
+}
+
+TEST_F(Start, OfALogoutEndsARunWhoseUploadStandsStill)
+{
+    logIn();
+    service->plan("/tracks stall 0");
+    Run first = start({writeDescription(minimal())});
+    ASSERT_TRUE(service->waitForStalled(1, kHangs));
+
+    run({"vlmr://logout/Loomrit"});
+    first.finish();
+    EXPECT_EQ(contentsOf(userFile("scat")), attributeFile("scat", {{"Loomrit", ""}}));
+}
+
+TEST_F(Start, PrefersTheHostsOfTheUserFolder)
+{
+    logIn();
+    useHost("127.0.0.1:1");
+    writeUserFile("service",
+                  attributeFile("service", {{"API Host", service->host()}, {"Web Host", service->host()}}));
+    run({writeDescription(minimal())});
+    EXPECT_EQ(received("/tracks").size(), 1u);
+}
