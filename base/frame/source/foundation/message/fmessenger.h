@@ -1,6 +1,7 @@
 #pragma once
 
 #include "containers/keyed/cmbtreedictionary.h"
+#include "containers/sequence/cmarray.h"
 #include "containers/sequence/cmlinkedlist.h"
 #include "containers/sequence/cmqueue.h"
 #include "foundation/message/imessenger.h"
@@ -41,16 +42,16 @@ class FMessenger : public CmObject, public IMessenger
     void postMessage(CmObject* receiver, FMessage* message, bool unique = false, int delay = 0);
     /// Posts a copy to each receiver of the group.
     void postMessage(int group, FMessage* message);
-    /// Posts to the receiver of this name, if there is one; with `network` the message first goes to other
+    /// Posts to the receiver of this name, if there is one; with `toNetwork` the message first goes to other
     /// processes.
-    void postMessage(const char* name, FMessage* message, bool network);
+    void postMessage(const char* name, FMessage* message, bool toNetwork);
 
     /// Calls the receiver now and gives its result, 0 where there is none.
     int sendMessage(CmObject* receiver, FMessage* message);
     /// Calls each receiver of the group; gives the result of the last one.
     int sendMessage(int group, FMessage* message);
     /// The names stay locked during the call, so that the receiver can't take its name back meanwhile.
-    int sendMessage(const char* name, FMessage* message, bool network);
+    int sendMessage(const char* name, FMessage* message, bool toNetwork);
 
     /// Delivers what is due; what is posted meanwhile waits for the next call. Main thread.
     void deliverMessages();
@@ -87,7 +88,8 @@ private:
     void doPostMessage(FUnknown* receiver, FMessage* message, bool unique, int delay);
     void doKillMessages(FUnknown* receiver, const char* messageType);
     void collectDue();
-    int countPosted(FUnknown* receiver, const char* messageType);
+    bool isAnythingPosted();
+    static int countPosted(const CmQueue& queue, FUnknown* receiver, const char* messageType);
     CmObject* lookupName(const char* name) const;
     CmLinkedList* groupAt(int group) const;
     void copyGroup(int group, CmLinkedList& result);
@@ -99,6 +101,8 @@ private:
     CmQueue readyQueue;
     FLock nameLock{"names"};
     std::atomic<bool> deliveranceLocked{false};
+    // The dictionary borrows its keys, since it has one ownership for them and the receivers.
+    CmArray nameKeys{0, 10};
     CmBTreeDictionary names;
     IPtr<CmLinkedList> notifyGroups;
     std::atomic<INetworkMessenger*> network{nullptr};

@@ -7,26 +7,25 @@
 #include "foundation/object/iupdatehandler.h"
 #include "foundation/thread/flock.h"
 
+#include <functional>
+
 namespace Update
 {
 /// One row of a bucket. Rows of one object stand together, in the order in which they were added.
 struct Dependency
 {
-    FUnknown* object;
-    IDependent* dependent;
+    FUnknown* object = nullptr;
+    IDependent* dependent = nullptr;
 
-    bool operator<(const Dependency& other) const;
-    bool operator>(const Dependency& other) const { return other < *this; }
-    bool operator<=(const Dependency& other) const { return !(other < *this); }
-    bool operator>=(const Dependency& other) const { return !(*this < other); }
+    bool operator<(const Dependency& other) const { return std::less<>()(object, other.object); }
     // By the object alone: it is what the ordered array looks for.
     bool operator==(const Dependency& other) const { return object == other.object; }
 };
 
 struct DeferedChange
 {
-    FUnknown* object;
-    int message;
+    FUnknown* object = nullptr;
+    int message = 0;
 
     bool operator==(const DeferedChange& other) const = default;
 };
@@ -34,9 +33,9 @@ struct DeferedChange
 /// A running update, with the dependents that it has still to call.
 struct Running
 {
-    FUnknown* object;
-    IDependent** snapshot;
-    int count;
+    FUnknown* object = nullptr;
+    IDependent** snapshot = nullptr;
+    int count = 0;
 };
 } // namespace Update
 
@@ -72,18 +71,21 @@ class UpdateHandler : public FObject, public IUpdateHandler, public IUpdateManag
 
 private:
     using Bucket = TOrderedArray<Update::Dependency>;
+    using ChangeList = TLinkedList<Update::DeferedChange>;
 
     Bucket& bucketOf(FUnknown* object);
-    static int firstOf(const Bucket& bucket, FUnknown* object);
-    bool hasDependent(FUnknown* object);
+    void skipInRunningUpdates(FUnknown* object, IDependent* dependent);
+    void removeFrom(Bucket& bucket, FUnknown* object, IDependent* dependent);
     bool isBeingUpdated(FUnknown* object);
-    int beginUpdate(Update::Running& running);
-    void tellDependents(const Update::Running& running, int message);
-    void endUpdate(const Update::Running& running);
+    void beginUpdate(Update::Running& running);
+    IDependent* dependentAt(const Update::Running& running, int index);
+    void endUpdate(Update::Running& running);
+    bool deferToDependents(FUnknown* object, int message);
     bool takeDeferred(FUnknown* object, Update::DeferedChange& change);
+    bool postpone(const Update::DeferedChange& change, ChangeList& postponed);
 
     FLock lock{"update handler"};
     Bucket dependentTable[256];
-    TLinkedList<Update::DeferedChange> deferredList;
+    ChangeList deferredList;
     TLinkedList<Update::Running*> updatesInProgress;
 };
