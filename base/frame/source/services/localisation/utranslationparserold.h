@@ -1,12 +1,16 @@
 #pragma once
 
+#include "containers/sequence/cmstack.h"
+#include "containers/value/buffer.h"
 #include "foundation/text/fstring.h"
 
 class ITranslationReceiver;
 
-/// Reads the old format of translation files: 8-bit text, and an element `Translation` with the code of its language.
+/// Reads the old format of translation files: 8-bit text in the default encoding, and an element `Translation` that
+/// names its language in an attribute.
 ///
-/// It knows its few tags by name and refuses everything else it doesn't expect at a place. *One thread at a time.*
+/// Tags that it doesn't know are passed over, whatever they hold; the known ones are expected in their places. *One
+/// thread at a time.*
 class UTranslationParserOld
 {
 public:
@@ -20,25 +24,24 @@ public:
     const char* getError() const { return error; }
     /// The line of the fault, from 1.
     int getLine() const;
-    /// The fault with the text around its place, marked.
+    /// The fault, and the text around its place with a mark.
     void makeErrorMessage(FString& message) const;
 
     static constexpr int kMaxAttributes = 8;
     static constexpr int kMaxComment = 32000;
     static constexpr int kMaxName = 127;
+    static constexpr int kMaxValue = 32000;
+    static constexpr int kMaxDepth = 100;
 
 private:
-    struct Attribute
-    {
-        char name[kMaxName + 1];
-        FString value;
-    };
     struct Tag
     {
-        char name[kMaxName + 1];
-        Attribute attributes[kMaxAttributes];
-        int attributeCount;
-        bool isEmpty;
+        FString name;
+        FString attributes[kMaxAttributes];
+        FString values[kMaxAttributes];
+        int count = 0;
+
+        const FString* valueOf(const char* attribute) const;
     };
 
     enum class Place
@@ -55,37 +58,38 @@ private:
 
     // Text to tags
     bool readMarkup();
-    bool readDeclaration();
-    bool readInstruction();
     bool readStartTag();
     bool readEndTag();
     bool readText();
     bool readAttributes(Tag& tag);
     bool readAttribute(Tag& tag);
-    bool readName(char* name);
-    bool skipTo(const char* end, const char* tooLong, const char* notClosed);
+    bool readName(FString& name);
+    bool skipPast(const char* end, const char* tooLong, const char* notClosed);
     void skipSpace();
-    bool atEnd() const { return position >= size; }
     bool startsWith(const char* text) const;
-    bool decodeAttributeValue(char quote, FString& value);
-    void decodeCharData(int from, int to, FString& text) const;
-    int decodeReference(int from, int to, FString& text) const;
+    int find(const char* wanted) const;
+    bool decodeAttributeValue(FString& value);
+    static void decodeCharData(const char* from, int length, Buffer& result);
 
     // Tags to rows
     bool beginElement(const Tag& tag);
+    bool beginTable(const Tag& tag, Place table);
     bool beginLanguage(const Tag& tag);
     bool beginString(const Tag& tag);
     bool beginTranslation(const Tag& tag);
-    bool endElement(const char* name);
-    bool takeText(const FString& text);
+    bool endElement(const FString& name);
+    bool endKnownElement(const FString& name);
+    bool endTranslation();
+    void takeText(FString& result);
 
     const char* data;
     int size;
     ITranslationReceiver& receiver;
     int position = 0;
     const char* error = "";
+    CmStack openTags;
     Place place = Place::kOutside;
     FString key;
     FString language;
-    FString text;
+    Buffer text;
 };
