@@ -18,7 +18,7 @@ class CmRegularExpression : public CmObject
     DECLARE_CLASS(CmRegularExpression, CmObject)
 
     CmRegularExpression();
-    explicit CmRegularExpression(const char16* expression, bool caseSensitive = true);
+    explicit CmRegularExpression(const char16* text, bool respectsCase = true);
     CmRegularExpression(const CmRegularExpression&) = default;
     CmRegularExpression& operator=(const CmRegularExpression&) = default;
 

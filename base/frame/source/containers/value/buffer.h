@@ -7,8 +7,8 @@ class String;
 /// A block of bytes that grows, and how far it is filled.
 ///
 /// `put` and the text operations write behind the fill size and let the block grow by whole multiples of the
-/// growth step. Operations give false and leave the content alone where no memory can be had; sizes are in bytes
-/// and below 4 GiB. One thread at a time.
+/// growth step. Bytes gained are zero. Operations give false where no memory can be had; sizes are in bytes and
+/// below 4 GiB. One thread at a time.
 class Buffer
 {
 public:
@@ -57,7 +57,7 @@ public:
 
     /// Fills the whole block.
     void set(uint8 value);
-    /// Fills what lies behind the fill size, which becomes the size.
+    /// Fills what lies behind the fill size, which stays.
     void fillup(uint8 value);
 
     // Moving bytes
@@ -95,9 +95,7 @@ public:
 
 protected:
     bool reserve(uint64 size);
-    bool insertFront(const void* data, uint32 count, uint32 terminatorSize);
-    bool appendTerminated(const void* data, uint32 count, uint32 terminatorSize);
-    bool takeText(String& text);
+    bool insertText(uint32 position, const void* text, size_t count, uint32 width);
 
     char* buffer = nullptr;
     uint32 memSize = 0;

@@ -23,7 +23,7 @@ class CmDate : public CmObject, public IDateModifier
 
     /// Today, in local time.
     CmDate();
-    explicit CmDate(unsigned julian);
+    explicit CmDate(unsigned julianDay);
     /// The day of a year; with the year 0 the days since 1 January 1901.
     CmDate(unsigned day, unsigned year);
     CmDate(unsigned day, unsigned month, unsigned year);

@@ -18,7 +18,7 @@ class CmTime : public CmObject, public ITime
 
     /// The current time of day by the local clock, with no date part.
     CmTime();
-    explicit CmTime(unsigned seconds);
+    explicit CmTime(unsigned count);
     CmTime(unsigned hour, unsigned minute, unsigned second);
     /// With `local`, an hour is taken off in daylight saving.
     CmTime(const CmDate& date, unsigned hour, unsigned minute, unsigned second, bool local);

@@ -14,6 +14,7 @@ class CmVariant : public CmObject
     DECLARE_CLASS(CmVariant, CmObject)
 
     CmVariant() = default;
+    explicit CmVariant(int number);
     explicit CmVariant(int64 number);
     explicit CmVariant(double number);
     CmVariant(const char16* text, bool copy);
@@ -23,6 +24,7 @@ class CmVariant : public CmObject
     ~CmVariant() override;
     CmVariant& operator=(const CmVariant& other);
     CmVariant& operator=(const FVariant& other);
+    CmVariant& operator=(int number);
     CmVariant& operator=(int64 number);
     CmVariant& operator=(double number);
 
@@ -66,7 +68,8 @@ class CmVariant : public CmObject
 
     // Ownership
 
-    /// Says whether the destructor frees the text or releases the object; a variant of numbers owns nothing.
+    /// Says whether the destructor frees the text, which must then come from `malloc`, or releases the object; a
+    /// variant of numbers owns nothing.
     void setOwner(bool owner);
     void empty();
     /// Makes a borrowed text or object owned: a copy, an added reference.
@@ -86,6 +89,8 @@ class CmVariant : public CmObject
     bool restoreAttributes(FAttributes& attributes) override;
 
 private:
+    void assignObject(FUnknown* object);
+
     // The numbers are kept in files.
     enum Type : uint32
     {

@@ -43,8 +43,6 @@ protected:
     bool evaluateOperands(void* context, CmVariant& left, CmVariant& right);
 
 private:
-    CmVariant compute(const CmVariant& left, const CmVariant& right) const;
-
     int operation;
     IPtr<FOperationNode> first;
     IPtr<FOperationNode> second;

@@ -8,8 +8,8 @@
 class IDSet : public BitSet
 {
 public:
-    /// Numbers count from `firstID`; room for `count` of them is made at a time.
-    IDSet(int firstID, int count);
+    /// Numbers count from `first`; room for `count` of them is made at a time.
+    IDSet(int first, int count);
 
     int newID();
     /// Numbers that were not handed out do no harm.

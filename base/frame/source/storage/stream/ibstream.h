@@ -1,10 +1,11 @@
 #pragma once
 
+#include "containers/value/resultcodes.h"
 #include "foundation/object/funknown.h"
 
 /// Results of stream interfaces; 0 is success.
 inline constexpr int32 kStreamFailed = 1;
-inline constexpr int32 kStreamInvalidArgument = 2;
+inline constexpr int32 kStreamInvalidArgument = kResultInvalidArgument;
 inline constexpr int32 kStreamSizeNotChanged = 4;
 
 /// A stream of bytes as a component sees it.
