@@ -19,7 +19,11 @@ class PatternWalk
 {
 public:
     PatternWalk(const char16* expression, unsigned count, bool isCaseSensitive)
-        : pattern(expression), length(count), caseSensitive(isCaseSensitive), reached(count + 1), next(count + 1)
+        : pattern(expression),
+          length(count),
+          caseSensitive(isCaseSensitive),
+          reached(count + 1),
+          next(count + 1)
     {
     }
 
@@ -82,12 +86,11 @@ private:
 };
 } // namespace
 
-CmRegularExpression::CmRegularExpression() : CmRegularExpression(nullptr)
-{
-}
+CmRegularExpression::CmRegularExpression() : CmRegularExpression(nullptr) {}
 
 CmRegularExpression::CmRegularExpression(const char16* text, bool respectsCase)
-    : expression(text), caseSensitive(respectsCase)
+    : expression(text),
+      caseSensitive(respectsCase)
 {
 }
 

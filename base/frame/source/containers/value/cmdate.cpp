@@ -27,9 +27,10 @@ const char16* wide(const char* literal)
 const char16* const monthNames[] = {wide("January"),   wide("February"), wide("March"),    wide("April"),
                                     wide("May"),       wide("June"),     wide("July"),     wide("August"),
                                     wide("September"), wide("October"),  wide("November"), wide("December")};
-const char16* const ucMonthNames[] = {wide("JANUARY"),   wide("FEBRUARY"), wide("MARCH"),    wide("APRIL"),
-                                      wide("MAY"),       wide("JUNE"),     wide("JULY"),     wide("AUGUST"),
-                                      wide("SEPTEMBER"), wide("OCTOBER"),  wide("NOVEMBER"), wide("DECEMBER")};
+const char16* const ucMonthNames[] = {wide("JANUARY"), wide("FEBRUARY"), wide("MARCH"),
+                                      wide("APRIL"),   wide("MAY"),      wide("JUNE"),
+                                      wide("JULY"),    wide("AUGUST"),   wide("SEPTEMBER"),
+                                      wide("OCTOBER"), wide("NOVEMBER"), wide("DECEMBER")};
 const char16* const weekDayNames[] = {wide("Monday"), wide("Tuesday"),  wide("Wednesday"), wide("Thursday"),
                                       wide("Friday"), wide("Saturday"), wide("Sunday")};
 const char16* const ucWeekDayNames[] = {wide("MONDAY"), wide("TUESDAY"),  wide("WEDNESDAY"), wide("THURSDAY"),
@@ -86,18 +87,14 @@ CmDate::CmDate()
     makeCurrent();
 }
 
-CmDate::CmDate(unsigned julianDay) : julian(julianDay)
-{
-}
+CmDate::CmDate(unsigned julianDay) : julian(julianDay) {}
 
 CmDate::CmDate(unsigned day, unsigned year)
     : julian(year == 0 ? day + kDaysBefore1901 : day + daysOfYears(year - 1) + kJanuaryOfYear1)
 {
 }
 
-CmDate::CmDate(unsigned day, unsigned month, unsigned year) : julian(julDay(day, month, year))
-{
-}
+CmDate::CmDate(unsigned day, unsigned month, unsigned year) : julian(julDay(day, month, year)) {}
 
 CmDate::CmDate(unsigned day, const char16* monthName, unsigned year)
     : julian(julDay(day, indexOfMonth(monthName), year))

@@ -65,13 +65,9 @@ CmTime::CmTime()
     makeCurrent();
 }
 
-CmTime::CmTime(unsigned count) : seconds(count)
-{
-}
+CmTime::CmTime(unsigned count) : seconds(count) {}
 
-CmTime::CmTime(unsigned hour, unsigned minute, unsigned second) : seconds(secondsOf(hour, minute, second))
-{
-}
+CmTime::CmTime(unsigned hour, unsigned minute, unsigned second) : seconds(secondsOf(hour, minute, second)) {}
 
 CmTime::CmTime(const CmDate& date, unsigned hour, unsigned minute, unsigned second, bool local)
     : seconds(secondsAt(date) + secondsOf(hour, minute, second))
@@ -80,7 +76,8 @@ CmTime::CmTime(const CmDate& date, unsigned hour, unsigned minute, unsigned seco
         seconds -= kSecondsPerHour;
 }
 
-CmTime::CmTime(const CmDate& date, const CmTime& time) : seconds(secondsAt(date) + time.seconds % kSecondsPerDay)
+CmTime::CmTime(const CmDate& date, const CmTime& time)
+    : seconds(secondsAt(date) + time.seconds % kSecondsPerDay)
 {
 }
 

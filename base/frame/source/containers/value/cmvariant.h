@@ -90,6 +90,7 @@ class CmVariant : public CmObject
 
 private:
     void assignObject(FUnknown* object);
+    bool restoreText(FAttributes& attributes, bool isWide);
 
     // The numbers are kept in files.
     enum Type : uint32

@@ -1,7 +1,9 @@
 #include "containers/value/idset.h"
 
 IDSet::IDSet(int first, int count)
-    : BitSet(count < 1 ? 1 : static_cast<uint32>(count)), firstID(first), growStep(getSize())
+    : BitSet(count < 1 ? 1 : static_cast<uint32>(count)),
+      firstID(first),
+      growStep(getSize())
 {
 }
 

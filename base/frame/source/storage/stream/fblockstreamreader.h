@@ -6,15 +6,13 @@
 
 /// Reads ahead in another stream by blocks, for reading forward in small pieces. Writes nothing.
 ///
-/// One thread at a time; nobody else may move the inner stream meanwhile.
+/// Nobody else may move the inner stream meanwhile, so of a reader and its copy only one goes on reading. One thread
+/// at a time.
 class FBlockStreamReader : public FStream
 {
     DECLARE_COPYABLE(FBlockStreamReader, FStream)
 
-    FBlockStreamReader(FStream* stream, uint32 blockSize);
-    /// Wraps the same stream, at the other reader's position, with nothing read ahead.
-    FBlockStreamReader(const FBlockStreamReader& other);
-    FBlockStreamReader& operator=(const FBlockStreamReader&) = delete;
+    FBlockStreamReader(FStream* innerStream, uint32 blockSize);
 
     int64 readRaw(void* target, int64 count) override;
     int64 writeRaw(const void* source, int64 count) override;

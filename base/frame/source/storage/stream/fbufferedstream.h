@@ -15,8 +15,8 @@ class FBufferedStream : public FStream
 {
     DECLARE_COPYABLE(FBufferedStream, FStream)
 
-    /// `blockSize` must not be 0.
-    FBufferedStream(FStream* stream, uint32 blockSize, bool writable, CmBufferPool* pool);
+    /// The block size must not be 0; the pool may be null.
+    FBufferedStream(FStream* innerStream, uint32 itsBlockSize, bool writable, CmBufferPool* itsPool);
     /// Wraps the same stream with a cache of its own.
     FBufferedStream(const FBufferedStream& other);
     ~FBufferedStream() override;
@@ -45,13 +45,12 @@ private:
         kDirty = 2
     };
 
-    void attach(FStream* newStream);
+    void finish();
     int64 blockStart() const { return blockIndex * blockSize(); }
     int64 blockSize() const { return buffer->getSize(); }
     bool isCanceled() const;
     void tellHook(int64 target) const;
     bool loadBlock();
-    int64 readFromBlock(char* target, int64 count);
     int64 writeAligned(const void* source, int64 count);
     int64 writeToBlock(const char* source, int64 count);
 

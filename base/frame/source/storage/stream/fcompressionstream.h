@@ -15,9 +15,9 @@ class FCompressionStream : public FStream
     DECLARE_COPYABLE(FCompressionStream, FStream)
 
     /// A null engine stands for the default one.
-    FCompressionStream(FStream* stream, FCompressionEngine* engine);
+    FCompressionStream(FStream* innerStream, FCompressionEngine* itsEngine);
     /// The engine is the component of that class; none where there is no such component.
-    FCompressionStream(FStream* stream, const FUID& engineClass);
+    FCompressionStream(FStream* innerStream, const FUID& engineClass);
     /// Shares stream and engine; nothing is begun.
     FCompressionStream(const FCompressionStream& other);
     ~FCompressionStream() override;
@@ -53,7 +53,7 @@ private:
     void takeFormOfStream();
     void endCompressor();
     void endDecompressor();
-    bool readAway(int64 count);
+    void readAway(int64 count);
 
     IPtr<FStream> stream;
     IPtr<FCompressionEngine> engine;
@@ -72,5 +72,5 @@ bool FCompressData(FStream* source, FStream* target, FCompressionEngine* engine,
 bool FDecompressData(FStream* source, FStream* target, FCompressionEngine* engine, UProgressHook* hook,
                      int bufferSize);
 
-/// Estimates compressed over plain size by the next 8192 bytes of the stream; 1.0 where that can't be told.
+/// Estimates compressed over plain size by reading about 8192 bytes on; 1.0 where that can't be told.
 float FGetCompressionRatio(FStream* source, FCompressionEngine* engine, float quality);

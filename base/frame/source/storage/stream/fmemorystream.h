@@ -67,6 +67,7 @@ class FMemoryStream : public FStream, public ISizeableStream, public IMemoryStre
 
 private:
     bool reallocate(int64 newAllocation);
+    bool readGrowing(FStream& from, int64 count);
     bool includeEnd(int64 end);
     void dropBlock();
     void copyBytes(const FMemoryStream& other);

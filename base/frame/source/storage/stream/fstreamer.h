@@ -80,10 +80,10 @@ public:
 
     /// A 32-bit count that includes the terminator, then as many bytes; null is a count of 0.
     bool writeStr8(const char* text);
-    /// A block of the stored count, to be freed by `delete[]`; null where the count is 0 or less or can't be read,
-    /// or no memory can be had. What the stream doesn't hold of the text reads as zeros.
+    /// A terminated block of the stored count, to be freed by `delete[]`; null where the count is 0 or less or can't
+    /// be read, or no memory can be had. Where the stream ends early, so does the block.
     [[nodiscard]] char* readStr8();
-    /// How many bytes `writeStr8` takes.
+    /// How many bytes `writeStr8` takes; 4 for null.
     static int64 getStr8Size(const char* text);
     /// The characters without a count.
     bool writeString8(const char* text, bool withTerminator);
@@ -106,6 +106,8 @@ protected:
     int16 byteOrder;
 
 private:
+    char* readLongStr8(int32 count);
+
     template <class T>
     static void reverse(T& value);
     template <class T>

@@ -11,9 +11,9 @@ class FStreamProxy : public FStream
 {
     DECLARE_COPYABLE(FStreamProxy, FStream)
 
-    /// The window begins at `start` of the inner stream; a `length` of 0 or less reaches to its end. `mode` is kept
-    /// for whoever made the window.
-    FStreamProxy(FStream* stream, int64 start, int64 length, int mode);
+    /// The window begins at `firstByte` of the inner stream; a `byteCount` of 0 or less reaches to its end. `accessMode`
+    /// is kept for whoever made the window.
+    FStreamProxy(FStream* innerStream, int64 firstByte, int64 byteCount, int accessMode);
 
     FStream* getStream() const { return stream; }
     int getMode() const { return mode; }
