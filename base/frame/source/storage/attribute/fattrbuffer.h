@@ -29,3 +29,7 @@ private:
     uint32 size = 0;
     bool isOwner = false;
 };
+
+/// The bytes of an object of the kinds that hold a block: FAttrBuffer, CmBuffer, as far as it is filled, and
+/// FMemoryStream. False for any other object and null. Borrowed.
+bool getBinaryBlock(const CmObject* object, const void*& data, uint32& size);

@@ -131,6 +131,7 @@ class FAttributes : public CmObject, public IAttributes
     bool isEmpty() const { return total() == 0; }
     /// In the order of the keys; borrowed, null where out of range.
     FStringIDAttribute* entryAt(int index) const;
+    bool removeEntryAt(int index);
     bool containsAttribute(const char* key) const;
     bool removeAttribute(const char* key);
     void removeAll();
@@ -173,7 +174,9 @@ private:
     template <class List>
     void saveList(List& list) const;
     FAttrList* findQueue(const char* key) const;
-    void loadEntry(const char* key, const FAttributeValue& value);
+    void loadEntry(const char* key, bool isAdditional, const FAttributeValue& value);
+    bool setUnknown(const char* key, FUnknown* unknown);
+    bool queueUnknown(const char* key, FUnknown* unknown);
     bool getBlock(const char* key, const void*& data, uint32& size) const;
 
     IPtr<FStringAttributeList> entries;

@@ -95,6 +95,10 @@ private:
     void assign(const FAttributeValue& other);
     void setType(unsigned bits) { type = static_cast<uint16>(bits); }
     CmString* ownString() const;
+    bool internalizeObject(FArchive& archive, unsigned storedType);
+    bool internalizeUnknown(FArchive& archive);
+    bool internalizeString(FArchive& archive, unsigned storedType);
+    bool internalizeNumber(FArchive& archive, unsigned storedType);
 
     union
     {

@@ -11,7 +11,8 @@ class FObjectList;
 /// Makes attribute trees free of live objects, so that they can be stored or sent without them.
 ///
 /// Each object in the tree gives place to a placeholder with what the object stores of itself, which is stripped in
-/// turn; at its further places it gives way to references. Objects that can't store themselves are dropped.
+/// turn; at its further places, and inside what objects store, it gives place to references. Objects that can't store
+/// themselves are dropped.
 /// One thread at a time; for one tree.
 class FCmObjectStripper
 {

@@ -28,10 +28,19 @@ public:
     bool writeObject(const CmObject* object, bool shared) override;
     int16 getVersion(const char* className) const override;
 
-    /// Reads a class, whose first number is `tag`. Null, with an error, where neither it nor a base class of its
-    /// record is known; the stream then stands behind the record.
+    /// Reads a class, whose first number is `tag`. Null where neither it nor a base class in its record is known;
+    /// the stream then stands behind the record.
     MetaClass* readClass(int32 tag);
     bool writeClass(MetaClass* meta);
+    /// Remembers that the class's record is written here.
+    void storeMetaClass(MetaClass* meta);
+    /// The class whose record was read there; null where none was, or none is known.
+    MetaClass* restoreMetaClass(uint32 recordPosition);
+    /// Where the object was written; 0 where it wasn't. An object that was must outlive the archive, for an address
+    /// that is used again would pass for it.
+    uint32 getObjectID(const CmObject* object) const;
+    /// Remembers that the object is written here.
+    void storeObjectID(const CmObject* object);
 
     // Files of the user folder, by name without folder and extension. Defined beside the other archives' files.
     /// Writes `object` by its `externalize`; on failure there is no such file.
@@ -57,15 +66,12 @@ private:
     };
 
     uint32 position() const;
-    void storeMetaClass(MetaClass* meta);
-    MetaClass* restoreMetaClass(uint32 recordPosition);
-    uint32 getObjectID(const void* object) const;
-    void storeObjectID(const CmObject* object);
     bool writeClassRecord(int32 marker, MetaClass* meta);
-    bool readClassRecord(StoredClass& record);
-    MetaClass* readClassRecords(int32 marker);
+    bool readClassRecord(int32 marker);
+    MetaClass* resolveClasses(size_t first);
     bool writeBody(const CmObject* object);
     CmObject* readBody(MetaClass* meta, const char* className, bool shared);
+    static IPtr<CmObject> createObject(const MetaClass& meta);
     bool internalizeBody(CmObject& object, int64 bodyStart, int32 length);
     CmObject* findRead(uint32 objectPosition, const char* className);
     CmObject* refuse();

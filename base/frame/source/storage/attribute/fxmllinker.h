@@ -29,9 +29,7 @@ private:
         FXmlInstance* holder;
         FXmlInstance* target;
     };
-    struct Visit;
-
-    void linkFrom(FXmlInstance* instance, std::vector<Visit>& open);
+    class Walk;
 
     CmHashTable instances;
     std::vector<Link> links;

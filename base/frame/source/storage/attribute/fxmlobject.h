@@ -37,3 +37,9 @@ unsigned gHashObject(const CmObject* object, unsigned size);
 
 /// The number that stands for the object in a table: as in `gHashObject`.
 uint64 getObjectNumber(const CmObject* object);
+
+/// The object, or that behind a placeholder, if it is a `className` (any, where that is null); else null. Borrowed.
+CmObject* resolveObject(CmObject* object, const char* className);
+
+/// The object that a component gave, where it was wrapped; otherwise as `resolveObject`.
+FUnknown* resolveUnknown(CmObject* object);

@@ -1,0 +1,3 @@
+#include "storage/attribute/fattrlist.h"
+
+DEFINE_ABSTRACT_CLASS(FAttrList, CmObject)

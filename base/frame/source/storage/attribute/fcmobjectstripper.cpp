@@ -1,0 +1,98 @@
+#include "storage/attribute/fcmobjectstripper.h"
+
+#include "containers/value/cmbuffer.h"
+#include "storage/attribute/fattrbuffer.h"
+#include "storage/attribute/fobjectlist.h"
+#include "storage/attribute/fsublist.h"
+#include "storage/stream/fmemorystream.h"
+
+namespace
+{
+/// What trees hold and files know as such.
+bool isPlainData(const CmObject* object)
+{
+    return FCast(FXmlObject, object) || FCast(FAttrList, object) || FCast(FAttrBuffer, object) ||
+           FCast(CmBuffer, object) || FCast(FMemoryStream, object);
+}
+} // namespace
+
+void FCmObjectStripper::stripCmObjects(FAttributes& attributes)
+{
+    CmHashTable seen(50);
+    seen.setHashFunction(gHashObject);
+    seen.setAutoResize(true);
+    stripAttributes(attributes, seen);
+    // By index: stripping what an object stores finds further ones.
+    for (size_t i = 0; i < waiting.size(); i++)
+    {
+        const IPtr<FXmlInstance> instance = waiting[i];
+        holder = instance;
+        stripAttributes(*instance->getStoredAttributes(), seen);
+    }
+    linker.link();
+}
+
+void FCmObjectStripper::stripAttributes(FAttributes& attributes, CmHashTable& seen)
+{
+    for (int i = attributes.total() - 1; i >= 0; i--)
+    {
+        if (!stripValue(*attributes.entryAt(i), seen))
+            attributes.removeEntryAt(i);
+    }
+}
+
+bool FCmObjectStripper::stripValue(FAttributeValue& value, CmHashTable& seen)
+{
+    CmObject* object = value.getObj();
+    if (auto* tree = FCast(FAttributes, object))
+        stripAttributes(*tree, seen);
+    else if (auto* trees = FCast(FSubList, object))
+        for (int i = 0; i < trees->total(); i++)
+            stripAttributes(*trees->at(i), seen);
+    else if (auto* list = FCast(FObjectList, object))
+        stripList(*list, seen);
+    else if (object && !isPlainData(object))
+    {
+        FXmlObject* placeholder = stripObject(object, seen);
+        value.setObj(placeholder, FAttributeValue::kOwned);
+        return placeholder != nullptr;
+    }
+    else if (value.getKind() == FAttributeValue::kUnknown)
+        return false;
+    return true;
+}
+
+void FCmObjectStripper::stripList(FObjectList& list, CmHashTable& seen)
+{
+    for (int i = list.total() - 1; i >= 0; i--)
+    {
+        if (isPlainData(list.at(i)))
+            continue;
+        auto placeholder = adopt(stripObject(list.at(i), seen));
+        if (placeholder)
+            list.replaceAt(i, placeholder);
+        else
+            list.removeAt(i);
+    }
+}
+
+FXmlObject* FCmObjectStripper::stripObject(CmObject* object, CmHashTable& seen)
+{
+    auto reference = adopt(new FXmlReference(getObjectNumber(object)));
+    if (!seen.lookup(reference))
+    {
+        auto tree = adopt(new FAttributes);
+        if (!object->storeAttributes(*tree))
+            return nullptr;
+        auto instance = adopt(new FXmlInstance(reference->getID(), object->getClass()->persistentName, tree));
+        stripped.push_back(object);
+        seen.add(instance);
+        waiting.push_back(instance);
+        linker.addInstance(instance);
+        if (!holder)
+            return instance.take();
+    }
+    // In what an object stores, all places are references: these may form circles, which the linker sees to.
+    linker.addReference(reference, holder);
+    return reference.take();
+}
