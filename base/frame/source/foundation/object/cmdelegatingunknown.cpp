@@ -4,10 +4,9 @@
 
 DEFINE_CLASS(CmDelegatingUnknown, CmObject)
 
-CmDelegatingUnknown::CmDelegatingUnknown(FUnknown* wrapped, FModule* owner) : delegate(wrapped), module(owner)
+CmDelegatingUnknown::CmDelegatingUnknown(FUnknown* wrapped, FModule* owner) : delegate(wrapped)
 {
-    if (module)
-        module->addInstance(this);
+    setModule(owner);
 }
 
 CmDelegatingUnknown::CmDelegatingUnknown(const CmDelegatingUnknown& other)
@@ -18,10 +17,18 @@ CmDelegatingUnknown::CmDelegatingUnknown(const CmDelegatingUnknown& other)
 
 CmDelegatingUnknown::~CmDelegatingUnknown()
 {
-    // The delegate's code is in the module, so it goes first.
+    // The delegate's code is in its module, so it goes first.
     delegate = nullptr;
+    setModule(nullptr);
+}
+
+void CmDelegatingUnknown::setModule(FModule* owner)
+{
     if (module)
         module->releaseInstance(this);
+    module = owner;
+    if (module)
+        module->addInstance(this);
 }
 
 int32 CmDelegatingUnknown::queryInterface(const char* interfaceID, void** object)

@@ -33,6 +33,11 @@ class CmDelegatingUnknown : public CmObject
     bool restoreAttributes(FAttributes& attributes) override;
 
 private:
+    /// Drops what it holds; null holds none.
+    void setModule(FModule* owner);
+    /// Puts a new component in place of the delegate, and holds its module.
+    void makeDelegate(const FUID& uid);
+
     IPtr<FUnknown> delegate;
     FModule* module = nullptr;
 };
