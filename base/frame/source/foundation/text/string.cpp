@@ -1,6 +1,7 @@
 #include "foundation/text/string.h"
 
 #include "foundation/object/fvariant.h"
+#include "foundation/object/iattributes.h"
 #include "foundation/text/charwidth.h"
 #include "foundation/text/itextservices.h"
 
@@ -306,6 +307,19 @@ void String::passToVariant(FVariant& variant)
     toVariant(variant);
     variant.setOwner(buffer != nullptr);
     pass();
+}
+
+bool String::toAttributes(IAttributes* attributes, const char* id) const
+{
+    FVariant variant;
+    toVariant(variant);
+    return attributes && attributes->set(id, variant);
+}
+
+bool String::fromAttributes(IAttributes* attributes, const char* id)
+{
+    FVariant variant;
+    return attributes && attributes->get(id, variant) && fromVariant(variant);
 }
 
 void String::toPascalString(unsigned char* result) const
