@@ -21,11 +21,13 @@ public:
     IPtr<FPath> current() override;
 
 private:
-    void skipUnwanted();
+    void settle();
+    bool isPackage() const;
 
     FNPath base;
     bool skipHidden;
     bool started = false;
+    std::string folderBytes;
     std::vector<std::string> entries;
     std::size_t index = 0;
     IPtr<FNPath> entry;

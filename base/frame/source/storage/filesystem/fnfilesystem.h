@@ -76,9 +76,7 @@ class FNFileSystem : public FFileSystem
     bool getFileTimes(FPath* path, CmTime& created, CmTime& modified) override;
     int64 getFileSize(FPath* path) override;
     int64 getFileSize(FStream* stream) override;
-    bool makeValidName(FString& name, char16 replacement, bool trim) override;
     FFileIterator* newIterator(const FPath* path, bool recursive) override;
-    int64 countFiles(const FPath* path, bool recursive, bool withFolders, int64* bytes) override;
 
     // Folders
     bool dirExists(FNPath* path);
@@ -137,7 +135,7 @@ class FNFileSystem : public FFileSystem
     int getDriveType(FNPath* path);
     /// For the user; null for a number that isn't one of DriveType or has no name.
     const char16* getDriveTypeString(int driveType);
-    /// The root of the path's volume; null where there is none.
+    /// The root at which the path begins; null for a relative path.
     IPtr<FNPath> getRootDir(const FNPath* path);
     /// `total` may be null.
     bool getFreeBytesOnDisk(FPath* path, uint64& freeBytes, uint64* total);
@@ -183,12 +181,16 @@ class FNFileSystem : public FFileSystem
     static bool isPrivate(const FNPath& path);
 
 private:
-    FStream* openUrl(FUrl* url);
+    static FStream* openUrl(FPath* url);
+    /// True for a stream that is none of a URL, too.
     static bool closeUrlStream(FStream* stream);
+    static FStream* attachFile(const FNPath& path, int descriptor, int flags, const char* fileMode,
+                               int* error);
     FStream* openNative(FNPath& path, int flags, int* error);
-    bool makeFolders(const FNPath& path);
-    bool removeContent(FNPath& folder);
+    int makeFolders(const FNPath& path);
+    bool removeContent(const FNPath& folder);
     bool copyNative(FNPath& from, FNPath& to, UProgressHook* hook, int* error);
+    bool copyTree(const FNPath& from, const FNPath& to, bool withFiles, UProgressHook* hook);
     bool moveAcrossDevices(FNPath& from, FNPath& to);
 
     int32 signature = 0x3F3F3F3F;

@@ -10,6 +10,7 @@
 class FNFileSystemScanner : public IFileIteratorImpl
 {
 public:
+    FNFileSystemScanner();
     explicit FNFileSystemScanner(const FNPath* folder);
     /// Begins with each FNPath of the list, which is copied.
     explicit FNFileSystemScanner(const CmLinkedList* folders);
@@ -25,10 +26,10 @@ public:
     IPtr<FPath> current() override;
 
 private:
-    void enterNextFolder();
-    void noteFolder();
+    void settle();
 
     CmLinkedList basePaths;
     CmLinkedList waiting;
     std::unique_ptr<FNFileIterator> walk;
+    bool started = false;
 };

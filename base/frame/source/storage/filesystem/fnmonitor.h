@@ -5,6 +5,7 @@
 #include "foundation/thread/flock.h"
 #include "storage/path/fnpath.h"
 
+#include <atomic>
 #include <memory>
 
 class FileSystemChange;
@@ -59,7 +60,7 @@ class FNMonitor : public CmObject
     /// Ends the thread; what it posted still arrives.
     void stop();
     /// Thread-safe.
-    bool isRunning() const;
+    bool isRunning() const { return running; }
 
     // Listeners
     /// `listener` hears of changes in `path` and below; the folder itself is watched, folders below it are watched by
@@ -75,12 +76,15 @@ class FNMonitor : public CmObject
     /// Adds a pattern once.
     void addExcludeFilter(const char16* pattern);
     void removeExcludeFilter(const char16* pattern);
-    bool isPathExcluded(const char16* fullPath);
-    /// The pattern that fits `path` itself or, with `withContent`, a folder and all below it.
+    bool isPathExcluded(const char16* fullPath) const;
+    /// A folder also counts as the beginning of its content, with a delimiter at its end.
+    bool isPathExcluded(const FNPath& path) const;
+    /// The pattern that fits `path` itself or, with `withContent`, a folder and all below it: "/a/b" or "/a/b/" and a
+    /// star.
     static void prepareExcludeFilter(const FPath* path, bool withContent, FString& pattern);
 
-    /// Posts a change to this monitor, unless its path is excluded or there is no messenger. Thread-safe.
-    void post(int kind, const FNPath* path, const FNPath* newPath);
+    /// Posts a change in a folder to this monitor, if there is a messenger. Thread-safe.
+    void post(int kind, const FNPath& folder, const FNPath* newFolder);
 
     int notify(FMessage* message) override;
 
@@ -88,9 +92,12 @@ class FNMonitor : public CmObject
 
 private:
     FNMonitor();
-    FNPathEntry* findEntry(const FNPath* path) const;
+    FNPathEntry* findEntry(const FNPath& path) const;
     FNListenerEntry* findListener(const IFileSystemListener* listener) const;
-    bool watch(const FNPath* path, int flags);
+    int findExclude(const char16* pattern) const;
+    bool watch(const FNPath& path, int flags);
+    void unwatch(const FNPath& path);
+    static bool concerns(const FNListenerEntry& entry, const FileSystemChange& change);
     void tell(const FileSystemChange& change);
 
     CmArray pathEntries;
@@ -98,9 +105,7 @@ private:
     mutable FLock lock{"file monitor"};
     CmArray excludes;
     std::unique_ptr<FNMonitorThread> thread;
-    static FNMonitor* theInstance;
-
-    friend void termFNMonitor();
+    std::atomic<bool> running{false};
 };
 
 /// Ends the monitor and takes the instance down.

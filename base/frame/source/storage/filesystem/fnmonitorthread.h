@@ -6,6 +6,7 @@
 #include "storage/filesystem/ifilewatcher.h"
 #include "storage/path/fnpath.h"
 
+#include <chrono>
 #include <map>
 #include <memory>
 #include <set>
@@ -34,7 +35,10 @@ private:
     using Folders = std::map<int, IPtr<FNPath>>;
 
     bool handle(IFileWatcher::Happening happening, int number);
+    void note(int number);
+    void noteAll();
     void postPending();
+    void post(int number, int kind);
     void forget(int number);
     IPtr<FNPath> folderOf(int number) const;
 
@@ -42,5 +46,7 @@ private:
     std::unique_ptr<IFileWatcher> watcher;
     mutable FLock lock{"watched folders"};
     Folders folders;
-    std::map<int, int> pending;
+    // Of the thread alone
+    std::set<int> pending;
+    std::chrono::steady_clock::time_point pendingSince;
 };

@@ -42,11 +42,14 @@ struct Opening
 
 /// A link that leads nowhere is kMissing, and isLink.
 Facts look(const std::string& path);
+/// Whether there is anything of that name, be it a link that leads nowhere.
+bool isTaken(const std::string& path);
 
 // Open files. `open` gives a descriptor, or -1 and the error.
 int open(const std::string& path, const Opening& how, int& error);
-/// The file takes the descriptor over; null where that fails.
-std::FILE* openBuffered(int descriptor, bool read, bool write, std::size_t bufferSize);
+/// The file takes the descriptor over; null where that fails. `mode` is that of the standard library and must fit
+/// the opening; it truncates nothing here.
+std::FILE* openBuffered(int descriptor, const char* mode, std::size_t bufferSize);
 int close(int descriptor);
 /// These give the number of bytes, or -1 with the error in `error`.
 int64 read(int descriptor, void* buffer, int64 count, int& error);
@@ -86,6 +89,12 @@ bool resolve(const std::string& path, std::string& target);
 // Rights and times
 bool isWritable(const std::string& path);
 int setWritable(const std::string& path, bool state);
+/// A file that can be run as a program.
+bool isExecutable(const std::string& path);
+/// Whether both paths lead to the same thing on disk.
+bool isSame(const std::string& left, const std::string& right);
+/// Gives `to` the rights of `from` and the time of its last change.
+int copyAttributes(const std::string& from, const std::string& to);
 
 // Volumes
 enum class Medium

@@ -35,10 +35,12 @@ class FNPath : public FPath
     FNPath(FNPath* base, FNPath* relative);
     explicit FNPath(IPath* other);
     /// A file or folder below a standard folder; `subFolder` may hold several levels, or be null. With `create` the
-    /// folders are made. A folder that isn't available leaves a relative path of the name alone.
+    /// folders are made. Where the folder isn't known, the path stays empty, so that nothing is taken for it by chance.
     FNPath(const char16* newName, int standardFolder, int newType, const char16* subFolder, bool create);
     FNPath(const FNPath& other) = default;
     FNPath& operator=(const FNPath& other) = default;
+
+    using FPath::newCopy;
 
     // Text
     bool fromString(const char16* text, int newType) override;
@@ -106,6 +108,9 @@ class FNPath : public FPath
 
 private:
     bool enterFolder(const FString& folder, bool create);
+    bool enterSubFolder(const char16* subFolder, bool create);
+    FFileType* typeOfContent();
+    void askPlatform();
     void splitText(const String& text);
 
     int32 platformState = -1;

@@ -71,8 +71,7 @@ class FPath : public CmObject, public IPath
     /// |------------|-----------|---------------|--------|
     /// | "a.txt"    | "txt"     | either        | 1      |
     /// | "a.txt"    | "bin"     | true          | -1     |
-    /// | "a.b c"    | none      | either        | 3      |
-    /// | "a. b"     | none      | either        | -1     |
+    /// | "a.b c"    | none      | either        | -1     |
     /// | ".profile" | any       | either        | -1     |
     int getExtensionIndex(bool useFileType) const;
     /// Gives a file the extension of its type. Without `replace` a name that ends in another extension keeps it and
@@ -92,8 +91,11 @@ class FPath : public CmObject, public IPath
     static void fromFrameworkFileType(const FFileType& fileType, FFileTypeInfo& result);
 
     // Moving
+    /// The path becomes a child of itself. Beware: a delimiter is added to a folder part that has none, so that a
+    /// name alone, "a", becomes "/a/b".
     virtual bool descend(const char16* childName, int childType);
-    /// The path becomes its folder; false at a root.
+    /// The path becomes its folder. False, with the path as it was, at a root and where the folder part of a relative
+    /// path has one component or none.
     virtual bool ascend();
     virtual bool isRootDir() const;
     virtual bool isRoot(const char16* text) const;
@@ -143,6 +145,13 @@ protected:
 
     /// All members become those of `other`.
     void takeParts(const FPath& other);
+    /// What another component tells of its path, by text.
+    void takeInterface(IPath& other);
+    FFileType* typeOfExtension() const;
+    /// Without a type that was found, the extension becomes the type, or "???" where there is none.
+    bool assignType(const FFileType* found);
+    /// Numbers the name until nothing of that name exists; `isTaken` asks.
+    bool numberName(bool (*isTaken)(FPath& path, void* context), void* context);
 
     FString name;
     FFileType fileType;
@@ -151,7 +160,6 @@ protected:
     FString path;
 
 private:
-    void takeInterface(IPath& other);
     bool endsInTypeExtension() const;
     bool ascendFromRoot();
 };

@@ -4,6 +4,7 @@
 #include "storage/stream/fstream.h"
 #include "storage/stream/isizeablestream.h"
 
+#include <cstdint>
 #include <cstdio>
 
 class FNPath;
@@ -38,12 +39,12 @@ class FFileStream : public FStream, public ISizeableStream
     int32 getSeekAlign() const { return seekAlign; }
 
     // Used by the file system
-    /// Takes over an open descriptor, or with `buffered` makes a standard file of 16384 bytes' buffer from it. False
-    /// where that fails, with the descriptor closed.
-    bool attach(int newDescriptor, bool buffered, int32 alignment);
+    /// Takes over an open descriptor. With `fileMode`, that of a standard file, it is used through one with a buffer of
+    /// 16384 bytes. False where that fails, with the descriptor closed.
+    bool attach(int newDescriptor, const char* fileMode, int32 alignment);
     /// The content is forced to the disk before the file is closed.
     void setSyncOnClose(bool state) { syncOnClose = state; }
-    /// Writes what is buffered and closes. False where that or any transfer before it failed, `getFirstError` tells
+    /// Writes what is held back and closes. False where that or any transfer before it failed, `getFirstError` tells
     /// why; true for a closed stream without an error. May be called again.
     bool close();
 
@@ -86,14 +87,14 @@ class FFileStream : public FStream, public ISizeableStream
 
 private:
     bool isCanceled(int64 count);
-    void prepareFor(int8_t operation);
+    void prepareFor(std::int8_t operation);
     int64 readFile(void* buffer, int64 count);
     int64 writeFile(const void* buffer, int64 count);
     int64 writeDescriptor(const void* buffer, int64 count);
     void preallocate(int64 count);
     int64 seekSystem(int64 position, int origin);
     void keepHookInStep(int64 position, FSeekMode seekMode);
-    bool finishWriting();
+    void finishWriting();
     void noteFileError();
 
     FNPath* path = nullptr;

@@ -62,13 +62,11 @@ class FUrl : public FPath, public IUrl
     // As a path
     bool fromString(const char16* text, int newType) override;
     bool getFullPath(FString& result) const override;
-    int32 setFullPath(const char16* text, int newType) override;
-    const FString& getName() const override { return FPath::getName(); }
     void setName(const char16* text) override;
     bool descend(const char16* childName, int childType) override;
     bool ascend() override;
     bool isRootDir() const override;
-    int32 getFullPath(char16* buffer) override { return FPath::getFullPath(buffer); }
+    using FPath::getFullPath;
     using FPath::newCopy;
 
     // Transfer
@@ -93,6 +91,8 @@ class FUrl : public FPath, public IUrl
 private:
     bool isFileProtocol() const;
     void parseHost(FString& text);
+    void appendHost(FString& text) const;
+    void dropHandler();
     void takeUrl(const FUrl& other);
 
     FUrlHandler* handler = nullptr;

@@ -21,5 +21,5 @@ class FUrlFileHandler : public FUrlHandler
 };
 
 FUrlHandler* createUrlFileHandler(FUrl& url);
-/// Registers the handler; once at start.
+/// Registers the handler and the converter between URLs and paths; once at start.
 void initFUrlFileHandler();
