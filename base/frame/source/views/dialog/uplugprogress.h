@@ -35,7 +35,8 @@ private:
         kEnded
     };
 
-    int32 ensureOpen();
+    int32 reopen();
+    void showLine();
     int percent() const;
 
     State state = State::kNew;
