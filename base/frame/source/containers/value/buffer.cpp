@@ -13,6 +13,18 @@ namespace
 {
 constexpr uint32 kDefaultDelta = 4096;
 
+/// The block at its new size, or null; the old one is gone in any case.
+char* reallocated(char* block, uint32 oldSize, uint32 size)
+{
+    if (void* grown = realloc(block, size))
+        return static_cast<char*>(grown);
+    void* copy = malloc(size);
+    if (copy && block)
+        memcpy(copy, block, std::min(oldSize, size));
+    free(block);
+    return static_cast<char*>(copy);
+}
+
 int digitValue(char digit)
 {
     if (digit >= '0' && digit <= '9')
@@ -78,14 +90,7 @@ bool Buffer::setSize(uint32 size)
         return true;
     }
 
-    buffer = static_cast<char*>(realloc(oldBuffer, size));
-    if (!buffer)
-    {
-        buffer = static_cast<char*>(malloc(size));
-        if (buffer && oldBuffer)
-            memcpy(buffer, oldBuffer, std::min(oldSize, size));
-        free(oldBuffer);
-    }
+    buffer = reallocated(oldBuffer, oldSize, size);
     if (!buffer)
         return false;
     if (size > oldSize)
