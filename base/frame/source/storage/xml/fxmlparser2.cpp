@@ -127,10 +127,13 @@ FXmlParser2::Outcome FXmlParser2::judge(int status, IBStream& stream)
     return Outcome::kDone;
 }
 
-bool FXmlParser2::isTokenTooLong() const
+// While a token is incomplete expat may put off looking at it, and then tells no place: it is where it was.
+bool FXmlParser2::isTokenTooLong()
 {
-    const int64 begin = XML_GetCurrentByteIndex(parser);
-    return begin >= 0 && bytesFed - begin > kMaxTokenBytes;
+    const int64 place = XML_GetCurrentByteIndex(parser);
+    if (place >= 0)
+        tokenStart = place;
+    return bytesFed - tokenStart > kMaxTokenBytes;
 }
 
 void FXmlParser2::stop()
@@ -164,6 +167,7 @@ bool FXmlParser2::reset(const char* encoding)
     install();
     documentStart = -1;
     bytesFed = 0;
+    tokenStart = 0;
     depth = 0;
     refused = false;
     return true;

@@ -50,7 +50,7 @@ private:
     void install();
     Outcome parseBlock(IBStream& stream);
     Outcome judge(int status, IBStream& stream);
-    bool isTokenTooLong() const;
+    bool isTokenTooLong();
     int errorCode() const;
 
     XML_ParserStruct* parser;
@@ -58,6 +58,7 @@ private:
     /// Where in the stream the document begins; -1 before it has begun.
     int64 documentStart = -1;
     int64 bytesFed = 0;
+    int64 tokenStart = 0;
     int depth = 0;
     /// A token was too long.
     bool refused = false;

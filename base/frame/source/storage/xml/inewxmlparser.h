@@ -22,7 +22,7 @@ public:
     virtual bool resume(IBStream* stream) = 0;
     /// Makes the parser ready for another document. `encoding` is null or overrides what the document says.
     virtual bool reset(const char* encoding) = 0;
-    /// Has no effect once parsing has begun; false then.
+    /// False, without effect, in the middle of a document.
     virtual bool setEncoding(const char* encoding) = 0;
     /// The reason and the line of the last failure, for the user. False where there was none to tell.
     virtual bool getErrorContext(IStringResult& text) = 0;
