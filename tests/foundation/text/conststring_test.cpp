@@ -128,10 +128,10 @@ TEST(ConstString, HandsItsTextOverInItsWidth)
 
 TEST(ConstString, SortsCharactersIntoClasses)
 {
-    for (const char16 space : {0x20, 0xA0, 0x2002, 0x200B, 0x202F, 0x205F, 0x3000})
-        EXPECT_TRUE(ConstString::isCharSpace(space)) << std::hex << space;
-    for (const char16 other : {0x09, 0x0A, 0x2001, 0x200C, 0x3001})
-        EXPECT_FALSE(ConstString::isCharSpace(other)) << std::hex << other;
+    for (const char16 space : u"\x20\xA0\u2002\u200B\u202F\u205F\u3000")
+        EXPECT_EQ(ConstString::isCharSpace(space), space != 0) << int{space};
+    for (const char16 other : u"\t\n\u2001\u200C\u3001")
+        EXPECT_FALSE(ConstString::isCharSpace(other)) << int{other};
     EXPECT_TRUE(ConstString::isCharSpace('\t'));
     EXPECT_FALSE(ConstString::isCharSpace('\xA0'));
 

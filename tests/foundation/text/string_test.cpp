@@ -213,8 +213,8 @@ TEST(String, ChangesCaseAndForm)
     String wideText(u"straße ÄÖ");
     wideText.toUpper();
     EXPECT_EQ(shape(wideText), "wide:STRAßE ÄÖ");
-    wideText.toLower(7);
-    wideText.toLower(99);
+    wideText.toLower(7u);
+    wideText.toLower(99u);
     EXPECT_EQ(shape(wideText), "wide:STRAßE äÖ");
 
     String composed(u"a\u0308\uFB01");

@@ -8,18 +8,20 @@
 
 namespace
 {
+using Words = std::map<std::string, std::string>;
+
 /// The environment's words on language and place, for one test.
 class Environment
 {
 public:
-    explicit Environment(std::map<std::string, std::string> wanted)
+    explicit Environment(const Words& wanted)
     {
         for (const char* name :
              {"LANGUAGE", "LC_ALL", "LC_MESSAGES", "LC_TIME", "LC_MEASUREMENT", "LANG", "TZ"})
         {
             if (const char* value = std::getenv(name))
                 before[name] = value;
-            set(name, wanted.count(name) ? wanted[name].c_str() : nullptr);
+            set(name, wanted.count(name) ? wanted.at(name).c_str() : nullptr);
         }
     }
 
@@ -30,6 +32,8 @@ public:
             set(name, before.count(name) ? before[name].c_str() : nullptr);
     }
 
+    Environment(const Environment&) = delete;
+
 private:
     static void set(const char* name, const char* value)
     {
@@ -39,7 +43,7 @@ private:
             unsetenv(name);
     }
 
-    std::map<std::string, std::string> before;
+    Words before;
 };
 
 ITextServices& services()
@@ -74,7 +78,7 @@ TEST(TextServices, WriteDatesAndTimesInTheUsersForm)
     const TextDate day{2026, 1, 2};
     const TextTime afternoon{15, 4, 5};
     {
-        const Environment german({{"LANG", "de_DE.UTF-8"}});
+        const Environment german(Words{{"LANG", "de_DE.UTF-8"}});
         EXPECT_EQ(date(day, TextDateStyle::kShort), "wide:02.01.26");
         EXPECT_EQ(date(day, TextDateStyle::kMedium), "wide:02.01.2026");
         EXPECT_EQ(date(day, TextDateStyle::kLong), "wide:2. Januar 2026");
@@ -82,12 +86,12 @@ TEST(TextServices, WriteDatesAndTimesInTheUsersForm)
         EXPECT_EQ(time(afternoon, true), "wide:15:04:05");
     }
     {
-        const Environment english({{"LANG", "de_DE.UTF-8"}, {"LC_TIME", "en_US.UTF-8"}});
+        const Environment english(Words{{"LANG", "de_DE.UTF-8"}, {"LC_TIME", "en_US.UTF-8"}});
         EXPECT_EQ(date(day, TextDateStyle::kShort), "wide:1/2/26");
         EXPECT_EQ(date(day, TextDateStyle::kLong), "wide:January 2, 2026");
         EXPECT_EQ(time(afternoon, true), "wide:3:04:05 PM") << "with a plain blank";
     }
-    const Environment plain({{"LC_ALL", "C"}});
+    const Environment plain(Words{{"LC_ALL", "C"}});
     EXPECT_EQ(date(day, TextDateStyle::kMedium), "wide:Jan 2, 2026");
     EXPECT_EQ(date({1500, 3, 1}, TextDateStyle::kMedium), "wide:Mar 1, 1500") << "one calendar throughout";
 }
@@ -100,7 +104,7 @@ TEST(TextServices, ReadWhatTheyWrite)
          {"en_US.UTF-8", "de_DE.UTF-8", "fr_FR.UTF-8", "es_ES.UTF-8", "it_IT", "ja_JP.UTF-8", "zh_CN.UTF-8",
           "ko_KR", "hu_HU", "th_TH", "fa_IR", "en_GB", "es_MX", "C"})
     {
-        const Environment environment({{"LC_ALL", locale}});
+        const Environment environment(Words{{"LC_ALL", locale}});
         for (const auto style : {TextDateStyle::kShort, TextDateStyle::kMedium, TextDateStyle::kLong})
         {
             String text;
@@ -125,13 +129,13 @@ TEST(TextServices, ReadWhatPeopleType)
     TextDate day;
     TextTime moment;
     {
-        const Environment german({{"LC_ALL", "de_DE.UTF-8"}});
+        const Environment german(Words{{"LC_ALL", "de_DE.UTF-8"}});
         EXPECT_TRUE(services().parseDate(u" 1.2.2026 ", day));
         EXPECT_EQ(day.month, 2);
         EXPECT_TRUE(services().parseTime(u"7:05", moment));
         EXPECT_EQ(moment.hour, 7);
     }
-    const Environment english({{"LC_ALL", "en_US.UTF-8"}});
+    const Environment english(Words{{"LC_ALL", "en_US.UTF-8"}});
     EXPECT_TRUE(services().parseTime(u"1:05 PM", moment));
     EXPECT_EQ(moment.hour, 13);
     EXPECT_TRUE(services().parseTime(u"1:05\u202FPM", moment));
@@ -152,7 +156,7 @@ TEST(TextServices, NameTheWantedLanguage)
 {
     struct Case
     {
-        std::map<std::string, std::string> environment;
+        Words environment;
         const char* name;
     };
     const Case cases[] = {
@@ -180,7 +184,7 @@ TEST(TextServices, KnowTheMeasurementSystem)
         {"en_US.UTF-8", 0}, {"de_DE.UTF-8", 1}, {"en_GB.UTF-8", -1}, {"C", -1}};
     for (const auto& [locale, system] : systems)
     {
-        const Environment environment({{"LC_MEASUREMENT", locale}, {"LANG", "fr_FR.UTF-8"}});
+        const Environment environment(Words{{"LC_MEASUREMENT", locale}, {"LANG", "fr_FR.UTF-8"}});
         EXPECT_EQ(services().getMeasurementSystem(), system) << locale;
     }
 }
@@ -197,7 +201,7 @@ TEST(TextServices, KnowTheZone)
          {Case{"Europe/Berlin", 3600, true}, Case{"UTC", 0, false}, Case{"Asia/Tokyo", 32400, false},
           Case{"America/New_York", -18000, true}, Case{"Australia/Sydney", 36000, true}})
     {
-        const Environment environment({{"TZ", each.zone}});
+        const Environment environment(Words{{"TZ", each.zone}});
         EXPECT_EQ(services().getZoneOffset(), each.offset) << each.zone;
         EXPECT_EQ(services().hasDaylightSaving(), each.hasDaylightSaving) << each.zone;
     }
