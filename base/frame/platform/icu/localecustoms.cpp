@@ -16,6 +16,13 @@ constexpr double kMillisecondsPerDay = 86400000.0;
 constexpr int kMaxText = 256;
 constexpr char16 kZone[] = u"Etc/GMT";
 
+void replaceBlanks(String& text)
+{
+    for (unsigned i = 0; i < text.length(); ++i)
+        if (ConstString::isCharSpace(text.getChar16(i)))
+            text.setChar16(i, u' ');
+}
+
 /// Owns a format of ICU; makes its dates Gregorian throughout and its blanks plain.
 class DateFormat
 {
@@ -55,6 +62,24 @@ public:
         return true;
     }
 
+    /// Days, months and hours that are written with two digits are read with one as well.
+    void takeShortNumbers()
+    {
+        const String pattern = getPattern();
+        String shortened;
+        bool isQuoted = false;
+        for (unsigned i = 0, run = 0; i < pattern.length(); ++i)
+        {
+            const char16 letter = pattern.getChar16(i);
+            isQuoted = isQuoted != (letter == u'\'');
+            run = i > 0 && pattern.getChar16(i - 1) == letter ? run + 1 : 1;
+            const bool isPair = run == 2 && pattern.getChar16(i + 1) != letter;
+            if (isQuoted || !isPair || ConstString(u"dMLHhkK").findNext(0, letter) < 0)
+                shortened.append(letter);
+        }
+        setPattern(shortened);
+    }
+
     /// Takes the whole text, or nothing.
     bool parse(const ConstString& text, double& moment)
     {
@@ -88,16 +113,9 @@ private:
 
     void makeBlanksPlain()
     {
-        char16 pattern[kMaxText];
-        if (!isUsable())
-            return;
-        const int length = udat_toPattern(format, false, pattern, kMaxText, &status);
-        if (U_FAILURE(status) || length >= kMaxText)
-            return;
-        for (int i = 0; i < length; ++i)
-            if (ConstString::isCharSpace(pattern[i]))
-                pattern[i] = u' ';
-        udat_applyPattern(format, false, pattern, length);
+        String pattern = getPattern();
+        replaceBlanks(pattern);
+        setPattern(pattern);
     }
 
     /// 31 February is no date.
@@ -105,6 +123,20 @@ private:
     {
         if (isUsable())
             udat_setLenient(format, false);
+    }
+
+    String getPattern()
+    {
+        char16 pattern[kMaxText] = {};
+        if (isUsable())
+            udat_toPattern(format, false, pattern, kMaxText - 1, &status);
+        return String(pattern);
+    }
+
+    void setPattern(const String& pattern)
+    {
+        if (isUsable())
+            udat_applyPattern(format, false, pattern.text16(), static_cast<int>(pattern.length()));
     }
 
     UErrorCode status = U_ZERO_ERROR;
@@ -153,9 +185,7 @@ TextTime timeOf(double moment)
 String withPlainBlanks(const char16* text)
 {
     String result(text);
-    for (unsigned i = 0; i < result.length(); ++i)
-        if (ConstString::isCharSpace(result.getChar16(i)))
-            result.setChar16(i, u' ');
+    replaceBlanks(result);
     result.trim();
     return result;
 }
@@ -163,6 +193,7 @@ String withPlainBlanks(const char16* text)
 /// Names of months and halves of the day may hold other blanks than the patterns, so the text is tried as it is too.
 bool parseEither(DateFormat&& format, const ConstString& plain, const ConstString& text, double& moment)
 {
+    format.takeShortNumbers();
     return format.parse(plain, moment) || format.parse(text, moment);
 }
 } // namespace

@@ -35,7 +35,7 @@ int CmString::split(const ConstString& text, CmContainer& result, const ConstStr
         const int found = text.findNext(start, sought);
         isLast = found < 0;
         const auto piece = adopt(new CmString);
-        text.extract(*piece, static_cast<unsigned>(start), isLast ? -1 : found - start);
+        piece->assign(ConstString(text, start), isLast ? -1 : found - start);
         if (trim)
             piece->trim(kGroupSpace);
         if (!piece->isEmpty() || (isLast && !dropEmptyLast))

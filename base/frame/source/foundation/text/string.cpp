@@ -126,7 +126,10 @@ bool String::resize(unsigned newLength, bool wide, bool fill)
     else if (newSize < oldSize)
         terminate(newLength);
     if (fill && newLength > len)
+    {
         fillWith(' ', len, newLength - len);
+        terminate(newLength);
+    }
     return true;
 }
 
