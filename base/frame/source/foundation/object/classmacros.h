@@ -38,7 +38,10 @@ FClassTag<void> fNearestDeclaredClass(const void*, FDeclaredAs<void>);
 // Overload resolution finds the nearest declared ancestor: the class's own overload is left out by FAllBut, and of
 // the others the most derived one wins.
 #define FCHECK_BASE_(Class, Base)                                                                            \
-    friend FClassTag<Class> fNearestDeclaredClass(const Class*, FDeclaredAs<Class>);                         \
+    [[maybe_unused]] friend FClassTag<Class> fNearestDeclaredClass(const Class*, FDeclaredAs<Class>)         \
+    {                                                                                                        \
+        return {};                                                                                           \
+    }                                                                                                        \
     void __fCheckDeclaration() const                                                                         \
     {                                                                                                        \
         static_assert(std::is_same_v<std::remove_cvref_t<decltype(*this)>, Class>,                           \
