@@ -1,0 +1,172 @@
+#include "../testobject.h"
+
+#include "containers/keyed/cmbtreedictionary.h"
+#include "containers/keyed/cmdictionary.h"
+#include "containers/keyed/cmhashdictionary.h"
+#include "containers/sequence/cmarray.h"
+#include "foundation/object/iptr.h"
+
+#include <gtest/gtest.h>
+
+TEST(CmAssociation, IsComparedByItsKey)
+{
+    Item one(1), sameOne(1), two(2), object(3), otherObject(4);
+    const CmAssociation first(&one, &object), same(&sameOne, &otherObject), greater(&two, &object), keyless;
+    EXPECT_TRUE(first.isEqual(&same));
+    EXPECT_FALSE(first.isEqual(&greater));
+    EXPECT_FALSE(first.isEqual(&one));
+    EXPECT_FALSE(keyless.isEqual(&keyless));
+    EXPECT_EQ(first.compare(&same), 0);
+    EXPECT_LT(first.compare(&greater), 0);
+    EXPECT_EQ(first.compare(&one), -1);
+    EXPECT_EQ(keyless.compare(&first), -1);
+    EXPECT_EQ(first.hash(7), one.hash(7));
+    EXPECT_EQ(keyless.hash(7), keyless.CmObject::hash(7));
+}
+
+namespace
+{
+template <class Dictionary>
+class DictionaryTest : public testing::Test
+{
+protected:
+    void TearDown() override { EXPECT_EQ(Item::alive, 0); }
+};
+using Dictionaries = testing::Types<CmDictionary, CmHashDictionary, CmBTreeDictionary>;
+TYPED_TEST_SUITE(DictionaryTest, Dictionaries);
+
+/// Keys 0 to `count` - 1, each with ten times itself.
+void fill(auto& dictionary, int count)
+{
+    dictionary.takeElements();
+    for (int rank = 0; rank < count; rank++)
+        EXPECT_TRUE(dictionary.add(new Item(rank), new Item(10 * rank)));
+}
+} // namespace
+
+TYPED_TEST(DictionaryTest, FindsObjectsByEqualKeys)
+{
+    TypeParam dictionary;
+    fill(dictionary, 40);
+    const Item key(7), absent(99);
+    EXPECT_EQ(rankOf(dictionary.lookupObject(&key)), 70);
+    EXPECT_EQ(dictionary.lookup(&key), dictionary.lookupObject(&key));
+    EXPECT_EQ(rankOf(dictionary.lookupAssoc(&key)->getKey()), 7);
+    EXPECT_TRUE(dictionary.contains(&key));
+    EXPECT_EQ(dictionary.occurrences(&key), 1);
+    EXPECT_EQ(dictionary.lookup(&absent), nullptr);
+    EXPECT_EQ(dictionary.lookupAssoc(nullptr), nullptr);
+    EXPECT_EQ(dictionary.occurrences(&absent), 0);
+}
+
+TYPED_TEST(DictionaryTest, KeepsThePairOfAPresentKey)
+{
+    TypeParam dictionary;
+    fill(dictionary, 3);
+    Item key(1), object(5);
+    EXPECT_FALSE(dictionary.add(&key, &object));
+    const IPtr<CmAssociation> ready = adopt(new CmAssociation(&key, &object));
+    EXPECT_FALSE(dictionary.add(ready));
+    EXPECT_FALSE(dictionary.add(&key)) << "no association";
+    EXPECT_FALSE(dictionary.add(nullptr, &object));
+    EXPECT_EQ(rankOf(dictionary.lookup(&key)), 10);
+    EXPECT_EQ(key.getRefCount() + object.getRefCount() + ready->getRefCount(), 3u);
+    EXPECT_EQ(dictionary.total(), 3);
+}
+
+TYPED_TEST(DictionaryTest, ReleasesKeyAndObjectInMode1)
+{
+    TypeParam dictionary;
+    fill(dictionary, 6);
+    Item key(2);
+    EXPECT_TRUE(dictionary.remove(&key));
+    EXPECT_FALSE(dictionary.remove(&key));
+    EXPECT_TRUE(dictionary.removeAt(0));
+    const auto it = iterate(dictionary);
+    EXPECT_TRUE(dictionary.remove(*it));
+    EXPECT_EQ(dictionary.total(), 3);
+    EXPECT_EQ(Item::alive, 7);
+    Item last(5);
+    EXPECT_TRUE(dictionary.replace(&last, new Item(1)));
+    EXPECT_TRUE(dictionary.replace(&last, dictionary.lookup(&last)));
+    EXPECT_FALSE(dictionary.replace(&key, nullptr));
+    EXPECT_EQ(rankOf(dictionary.lookup(&last)), 1);
+    dictionary.removeAll();
+    EXPECT_TRUE(dictionary.isEmpty());
+    EXPECT_EQ(Item::alive, 2);
+}
+
+TYPED_TEST(DictionaryTest, OwnsItsAssociationsInEveryMode)
+{
+    Item key(1), object(2), otherKey(3);
+    {
+        TypeParam shared;
+        EXPECT_TRUE(shared.add(&key, &object));
+        auto* ready = new CmAssociation(&otherKey, &object);
+        ready->addRef();
+        EXPECT_TRUE(shared.add(ready));
+        EXPECT_TRUE(shared.remove(&otherKey));
+        EXPECT_EQ(ready->release(), 0u);
+    }
+    EXPECT_EQ(key.getRefCount(), 1u);
+
+    // In mode 2 key and object get no reference and still lose one.
+    TypeParam retaining;
+    retaining.retainElements();
+    key.addRef();
+    object.addRef();
+    EXPECT_TRUE(retaining.add(&key, &object));
+    EXPECT_EQ(retaining.lookupAssoc(&key)->getRefCount(), 1u);
+    EXPECT_EQ(key.getRefCount(), 2u);
+    EXPECT_TRUE(retaining.remove(&key));
+    EXPECT_EQ(key.getRefCount(), 1u);
+    EXPECT_EQ(object.getRefCount(), 1u);
+}
+
+TYPED_TEST(DictionaryTest, CopiesHaveTheirOwnAssociations)
+{
+    TypeParam owning;
+    fill(owning, 3);
+    const Item key(2);
+    {
+        TypeParam copied(owning);
+        EXPECT_NE(copied.lookup(&key), owning.lookup(&key));
+        EXPECT_EQ(rankOf(copied.lookup(&key)), 20);
+        copied = owning;
+        EXPECT_EQ(copied.total(), 3);
+    }
+    for (int16 mode : {CmContainer::kShared, CmContainer::kRetained})
+    {
+        TypeParam copied;
+        owning.setOwnership(mode);
+        copied.copy(owning);
+        owning.takeElements();
+        EXPECT_EQ(copied.lookup(&key), owning.lookup(&key));
+        EXPECT_NE(copied.lookupAssoc(&key), owning.lookupAssoc(&key));
+    }
+    EXPECT_EQ(rankOf(owning.lookup(&key)), 20);
+}
+
+TEST(CmBTreeDictionary, IsReadInOrderOfKeys)
+{
+    CmBTreeDictionary dictionary(3);
+    dictionary.takeElements();
+    for (int rank : {5, 2, 9, 1, 7})
+        dictionary.add(new Item(rank), new Item(rank));
+    std::string order;
+    for (auto it = iterate(dictionary); !it->done();)
+        order += std::to_string(rankOf(static_cast<CmAssociation*>(it->next())->getKey()));
+    EXPECT_EQ(order, "12579");
+}
+
+TEST(CmDictionary, FindsTheFirstKeyOfAnObject)
+{
+    CmDictionary dictionary;
+    dictionary.takeElements();
+    for (int rank : {4, 5, 6})
+        dictionary.add(new Item(rank), new Item(rank / 5));
+    const Item one(1), nine(9);
+    EXPECT_EQ(rankOf(dictionary.lookupKey(&one)), 5);
+    EXPECT_EQ(dictionary.lookupKey(&nine), nullptr);
+    EXPECT_EQ(dictionary.lookupKey(nullptr), nullptr);
+}
