@@ -62,7 +62,7 @@ class FDefaultPool : public CmObject, public IDefaultPool3
 
 private:
     FDefaults* findGroup(const char* group) const;
-    const FAttributes* findValues(const char* group) const;
+    const FDefaults* findDefaults(const char* group) const;
     void restoreAutoSavers();
 
     CmLinkedList defaults;

@@ -14,8 +14,8 @@ class FFileType;
 class FBinArchive : public FAttributeArchiveBase
 {
 public:
-    /// `owner` may be null; it hears of errors.
-    FBinArchive(FStream* archiveStream, bool isWriting, FArchive* owner = nullptr);
+    /// The owning archive may be null; it hears of errors. Borrowed.
+    FBinArchive(FStream* archiveStream, bool isWriting, FArchive* owningArchive = nullptr);
 
     // False at the first failure.
     bool save();
@@ -27,7 +27,8 @@ public:
     static const FFileType& fileType();
 
 private:
-    bool finish(bool success);
+    /// Lets the owner hear of a failure.
+    bool tell(bool success);
 
     FArchive* owner;
     /// What goes to or comes from the stream next.

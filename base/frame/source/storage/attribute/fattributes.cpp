@@ -102,6 +102,21 @@ void FAttributes::addAllFrom(const FAttributes& other)
     }
 }
 
+void FAttributes::takeAllFrom(FAttributes& other)
+{
+    if (this == &other)
+        return;
+    const IPtr<FStringAttributeList> taken = std::move(other.entries);
+    if (isEmpty())
+        entries = taken;
+    else
+        for (int i = 0; taken && i < taken->total(); i++)
+        {
+            taken->entryAt(i)->addRef();
+            entries->takeEntry(taken->entryAt(i));
+        }
+}
+
 // Single values
 
 bool FAttributes::set(const char* key, long long value)

@@ -132,6 +132,8 @@ class FAttributes : public CmObject, public IAttributes
     /// In the order of the keys; borrowed, null where out of range.
     FStringIDAttribute* entryAt(int index) const;
     bool removeEntryAt(int index);
+    /// The entry of this key, which is made where there is none.
+    FStringIDAttribute& entry(const char* key);
     bool containsAttribute(const char* key) const;
     bool removeAttribute(const char* key);
     void removeAll();
@@ -153,6 +155,8 @@ class FAttributes : public CmObject, public IAttributes
     static constexpr unsigned int kAdditionalAttributes = 0xFFFFFFFF;
     /// Copies each entry, replacing what the key held.
     void addAllFrom(const FAttributes& other);
+    /// Moves each entry here, replacing what the key held; the other tree is empty afterwards.
+    void takeAllFrom(FAttributes& other);
 
     int32 queryInterface(const char* interfaceID, void** object) override;
     bool externalize(FArchive& archive) const override;
@@ -162,7 +166,6 @@ class FAttributes : public CmObject, public IAttributes
     FORWARD_FUNKNOWN(CmObject)
 
 private:
-    FStringIDAttribute& entry(const char* key);
     FStringIDAttribute* find(const char* key) const;
     FStringIDAttribute* findNumber(const char* key) const;
     template <class List>

@@ -1,0 +1,204 @@
+#include "foundation/text/iuseralert.h"
+#include "foundation/text/utranslatedstring.h"
+#include "storage/archive/archivefiles.h"
+#include "storage/archive/fxmlarchive.h"
+#include "storage/filesystem/fnfilesystem.h"
+#include "storage/stream/ffiletype.h"
+#include "storage/stream/fopenflags.h"
+#include "storage/stream/fstream.h"
+
+// XML archives as files of the user folder, and how they are replaced.
+
+namespace
+{
+UTranslatedString stringDoYouWantToReplace("Do you want to replace ");
+UTranslatedString strReplace("Replace");
+UTranslatedString strCancel("Cancel");
+
+constexpr int kQuestion = 1;
+constexpr int kReplaceButton = 1;
+constexpr int kReadShared = kFileRead | kFileShare;
+
+FNPath getUserPath(const char16* name)
+{
+    return getArchivePath(name, FNPath::kUserFolder, FXmlArchive::fileTypeNormal());
+}
+
+FNPath getBackupPath(const char16* name)
+{
+    return getArchivePath(name, FNPath::kUserFolder, FXmlArchive::fileTypeBackup());
+}
+
+bool mayReplace(const char16* name)
+{
+    IUserAlert* alert = IUserAlert::get();
+    if (!alert)
+        return false;
+    FString question(stringDoYouWantToReplace.text());
+    question.append(name);
+    question.append("?");
+    const int answer = alert->run(question.text16(), kQuestion, strReplace.text(), strCancel.text(), nullptr);
+    return answer == kReplaceButton;
+}
+
+/// Gives the file the name of its older twin, whose path the caller gets; null where that failed.
+FNPath* stepAside(const FNPath& path, const char16* name)
+{
+    FString oldName(name);
+    oldName.append("_old");
+    auto twin = adopt(new FNPath(getUserPath(oldName.text16())));
+    if (gFileSystem->fileExists(twin))
+        gFileSystem->removeFile(twin);
+    FNPath renamed(path);
+    return gFileSystem->renameFile(&renamed, twin->getName().text16()) ? twin.take() : nullptr;
+}
+
+bool closeFile(FStream* stream)
+{
+    return gFileSystem->closeFile(stream);
+}
+} // namespace
+
+const FFileType& FXmlArchive::fileTypeNormal()
+{
+    static const FFileType& type = registerArchiveType("xml", "TEXT", "Vellamoor XML File");
+    return type;
+}
+
+const FFileType& FXmlArchive::fileTypeBackup()
+{
+    static const FFileType& type = registerArchiveType("xml.backup", "TEXT", "Vellamoor XML File (Backup)");
+    return type;
+}
+
+// Replacing
+
+FStream* FXmlArchive::openUserFile(const char16* name)
+{
+    return openArchiveFile(name, kReadShared, fileTypeNormal());
+}
+
+FStream* FXmlArchive::createUserFile(const char16* name, bool askUser, FNPath*& oldPath)
+{
+    oldPath = nullptr;
+    FNPath path = getUserPath(name);
+    if (!gFileSystem || !path.isAbsolute())
+        return nullptr;
+    const bool isReplacing = gFileSystem->fileExists(&path);
+    if (isReplacing && askUser && !mayReplace(name))
+        return nullptr;
+    if (isReplacing)
+        oldPath = stepAside(path, name);
+    FStream* stream = gFileSystem->createFile(&path, kFileWrite, nullptr);
+    if (!stream)
+    {
+        // Without an older twin to put back, what stands there is the earlier file itself.
+        if (oldPath)
+            finishXmlArchiveWrite(false, name, oldPath);
+        oldPath = nullptr;
+    }
+    return stream;
+}
+
+void FXmlArchive::finishXmlArchiveWrite(bool success, const char16* name, FNPath* oldPath)
+{
+    const auto twin = adopt(oldPath);
+    FNPath path = getUserPath(name);
+    if (!success)
+        gFileSystem->removeFile(&path);
+    if (twin && success)
+        gFileSystem->removeFile(twin);
+    else if (twin)
+        gFileSystem->renameFile(twin, path.getName().text16());
+}
+
+// Trees and objects
+
+bool FXmlArchive::saveAttributes(const char16* name, const char* rootTag, const FAttributes& attributes)
+{
+    FNPath* oldPath = nullptr;
+    FStream* file = createUserFile(name, false, oldPath);
+    if (!file)
+        return false;
+    const bool isWritten = FXmlArchive(file, true).saveAttributes(rootTag, attributes);
+    const bool isWhole = closeFile(file) && isWritten;
+    finishXmlArchiveWrite(isWhole, name, oldPath);
+    return isWhole;
+}
+
+bool FXmlArchive::storeObject(const char16* name, const char* rootTag, CmObject* object, bool askUser)
+{
+    FNPath* oldPath = nullptr;
+    FStream* file = object ? createUserFile(name, askUser, oldPath) : nullptr;
+    if (!file)
+        return false;
+    bool isWritten = false;
+    {
+        FXmlArchive archive(file, true);
+        archive.addRoot(rootTag, object);
+        isWritten = archive.save(rootTag);
+    }
+    const bool isWhole = closeFile(file) && isWritten;
+    finishXmlArchiveWrite(isWhole, name, oldPath);
+    return isWhole;
+}
+
+bool FXmlArchive::loadAttributes(const char16* name, const char* rootTag, FAttributes& attributes)
+{
+    FStream* file = openUserFile(name);
+    if (!file)
+        return false;
+    // A tree of its own: of a damaged file nothing is used.
+    FAttributes tree;
+    const bool isRead = FXmlArchive(file, false).loadAttributes(rootTag, tree);
+    closeFile(file);
+    if (isRead)
+        attributes.takeAllFrom(tree);
+    return isRead;
+}
+
+bool FXmlArchive::restoreObject(const char16* name, const char* rootTag, CmObject* object)
+{
+    FStream* file = openUserFile(name);
+    if (!file)
+        return false;
+    const bool isRestored = restoreObject(file, rootTag, object);
+    closeFile(file);
+    return isRestored;
+}
+
+// Files
+
+bool FXmlArchive::objectArchiveExists(const char16* name)
+{
+    return archiveFileExists(name, fileTypeNormal());
+}
+
+bool FXmlArchive::removeObjectArchive(const char16* name)
+{
+    return removeArchiveFile(name, fileTypeNormal());
+}
+
+bool FXmlArchive::renameObjectArchive(const char16* oldName, const char16* newName)
+{
+    return renameArchiveFile(oldName, newName, fileTypeNormal());
+}
+
+bool FXmlArchive::backupObjectArchive(const char16* name)
+{
+    FNPath path = getUserPath(name);
+    FNPath backup = getBackupPath(name);
+    return gFileSystem && path.isAbsolute() && gFileSystem->copyFile(&path, &backup, nullptr, nullptr);
+}
+
+bool FXmlArchive::restoreObjectArchive(const char16* name)
+{
+    FNPath path = getUserPath(name);
+    FNPath backup = getBackupPath(name);
+    if (!gFileSystem || !backup.isAbsolute() || !gFileSystem->fileExists(&backup))
+        return false;
+    const bool isRemoved = gFileSystem->removeFile(&path);
+    // The backup goes only when its copy is there.
+    const bool isCopied = gFileSystem->copyFile(&backup, &path, nullptr, nullptr);
+    return isCopied && gFileSystem->removeFile(&backup) && isRemoved;
+}
