@@ -7,9 +7,7 @@
 
 #include <gtest/gtest.h>
 
-#include <algorithm>
-
-namespace
+namespace CompressionTest
 {
 /// Writes each byte followed by how often it comes, at most 255 times; what is begun is written at the end.
 class RunCompressor : public FCompressor
@@ -107,14 +105,14 @@ class RunEngine : public FCompressionEngine
     int type = kDefaultEngine;
 };
 
-FUnknown* makeEngine(int type)
+static FUnknown* makeEngine(int type)
 {
     auto* engine = new RunEngine;
     engine->type = type;
     return static_cast<CmObject*>(engine);
 }
 
-const FUID kOtherClass(7, 7, 7, 1), kDefaultClass(7, 7, 7, 2), kWrongClass(7, 7, 7, 3);
+static const FUID kOtherClass(7, 7, 7, 1), kDefaultClass(7, 7, 7, 2), kWrongClass(7, 7, 7, 3);
 
 /// A registry with three components of the category, of which the last is the default engine.
 struct Registry
@@ -137,12 +135,12 @@ struct Registry
     FComponentRegistry registry;
 };
 
-std::string sampleText()
+static std::string sampleText()
 {
     return std::string(300, 'a') + "bc" + std::string(700, 'd');
 }
 
-IPtr<FMemoryStream> packed(const std::string& bytes)
+static IPtr<FMemoryStream> packed(const std::string& bytes)
 {
     auto target = adopt(new FMemoryStream);
     FMemoryStream source = streamOf(bytes);
@@ -161,7 +159,9 @@ struct Unpacking
     IPtr<RunEngine> engine = adopt(new RunEngine);
     IPtr<FCompressionStream> stream = adopt(new FCompressionStream(packed(sampleText()), engine));
 };
-} // namespace
+} // namespace CompressionTest
+
+using namespace CompressionTest;
 
 TEST(FCompressionStream, GivesBackWhatWasWritten)
 {
