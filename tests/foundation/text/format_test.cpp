@@ -20,7 +20,7 @@ void expectAlike(const char* format, Values... values)
 
 TEST(Format, PrintsNumbersAlikeInBothWidths)
 {
-    expectAlike("plain 100%%");
+    expectAlike("plain %d%%", 100);
     expectAlike("%d %5d|%-5d|%05d|%+d|% d", -1, 22, 33, 44, 55, 66);
     expectAlike("%i %u %x %X %#x %o", -3, 4000000000u, 255, 255, 255, 8);
     expectAlike("%hd %ld %lld %zu %jd %td", static_cast<short>(7), -8L, -9LL, sizeof(int), intmax_t{5},

@@ -41,7 +41,8 @@ TEST(String, SurvivesBeingItsOwnSource)
     EXPECT_EQ(shape(text), "narrow:cefdefcdef");
     text.replace(0, 3, text);
     EXPECT_EQ(shape(text), "narrow:cefdefcdefdefcdef");
-    text = text;
+    const String& itself = text;
+    text = itself;
     EXPECT_EQ(text.length(), 17u);
 }
 

@@ -1,7 +1,7 @@
 #include "foundation/text/wideformat.h"
 
 #include "foundation/text/charwidth.h"
-#include "foundation/text/conststringtable.h"
+#include "foundation/text/string.h"
 
 #include <algorithm>
 #include <cstddef>
@@ -232,12 +232,15 @@ void Formatter::putPadded(const Conversion& conversion, const char16* text, unsi
 
 void Formatter::putText(const Conversion& conversion)
 {
+    const int limit = conversion.precision < 0 ? kMaxFormattedLength : conversion.precision;
     if (conversion.hasLength("h"))
-        return putNumber(conversion, va_arg(arguments, const char*));
+    {
+        const String wide(va_arg(arguments, const char*), limit);
+        return putPadded(conversion, wide.text16(), wide.length());
+    }
     const char16* text = va_arg(arguments, const char16*);
     if (!text)
         text = u"(null)";
-    const int limit = conversion.precision < 0 ? kMaxFormattedLength : conversion.precision;
     putPadded(conversion, text, measureText(text, static_cast<unsigned>(limit)));
 }
 

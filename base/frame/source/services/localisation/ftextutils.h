@@ -3,7 +3,7 @@
 #include "foundation/text/string.h"
 
 /// What a number means to the user, for its reading and writing.
-enum UTextFormatType
+enum UTextFormatType : int
 {
     kTextFormatNone = -1,
     kTextFormatSampleRate = 0,
