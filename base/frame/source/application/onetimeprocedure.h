@@ -22,6 +22,8 @@ public:
     OneTimeProcedure(const OneTimeProcedure&) = delete;
     OneTimeProcedure& operator=(const OneTimeProcedure&) = delete;
 
+    const char* getName() const { return name; }
+
     /// Runs every initializer up to this level that has not run yet. False at the first one that fails: no other
     /// initializer runs from then on.
     static bool initialize(unsigned level);

@@ -7,6 +7,7 @@
 #include "foundation/text/fstring.h"
 #include "storage/path/fnpath.h"
 
+#include <atomic>
 #include <memory>
 
 class FComponentDescription;
@@ -133,7 +134,7 @@ protected:
 
 private:
     void initTranslator();
-    bool initProcedures();
+    void runPrepared(int64 startTicks);
     void waitForSplash(int64 startTicks);
     void stopStart();
     void destroyGlobals();
@@ -142,11 +143,17 @@ private:
     UAppType appType;
     bool exitRequested = false;
     bool warningsEnabled = false;
-    int backgroundState = -2;
+
+protected:
+    /// What the base `postInit` waits for: 1 while there is work in the background, which may be done by another
+    /// thread; then above -2 to quit, or -2.
+    std::atomic<int> backgroundState{-2};
     FNPath skinPath;
     UMenu* fileMenu = nullptr;
     UMenu* editMenu = nullptr;
     UView* splashView = nullptr;
+
+private:
     std::unique_ptr<FThread> mainThread;
     CmLinkedList warnings;
 

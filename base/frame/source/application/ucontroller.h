@@ -13,6 +13,7 @@
 #include <atomic>
 
 class UApplication;
+class UMenu;
 
 /// Drives the application: the idle pulse, quitting, the folders of the program.
 ///
@@ -39,7 +40,12 @@ class UController : public CmObject, public IPlatform2, public IStandardFolders
     /// The platform's question whether the process may end now.
     static bool canTerminate();
 
+    /// Borrowed; active while the run lasts.
+    void setMenuBar(UMenu* menus) { menuBar = menus; }
+
     // Idle pulse
+    /// Whether the clients of the pulse are being told just now.
+    bool isInIdleDispatch() const { return inIdleDispatch; }
     /// Does the deferred work of 16 ms. `throttled` callers are held back to one pulse in ten milliseconds. False
     /// only while suspended.
     bool onIdle(bool throttled);
@@ -86,6 +92,12 @@ class UController : public CmObject, public IPlatform2, public IStandardFolders
 protected:
     /// The earliest time of the next throttled pulse.
     int64 idealNextIdle = 0;
+    // The state of the input, for windows.
+    bool mouseSuspended = false;
+    bool updatesSuspended = false;
+    int modifiers = 0;
+    /// Milliseconds.
+    int doubleClickTime = 200;
 
 private:
     bool initPlatform(int applicationType);
@@ -97,14 +109,10 @@ private:
 
     bool done = false;
     bool flushEnabled = true;
-    bool mouseSuspended = false;
     bool inIdle = false;
     bool idleSuspended = false;
-    bool updatesSuspended = false;
     bool inIdleDispatch = false;
-    int modifiers = 0;
-    int doubleClickTime = 200;
-    CmObject* menuBar = nullptr;
+    UMenu* menuBar = nullptr;
     FLock idleLock{"idle"};
     CmArray idleClients{0, 10};
     FLock destructionLock{"destruction"};
