@@ -34,11 +34,11 @@ void FCmObjectStripper::stripCmObjects(FAttributes& attributes)
 
 void FCmObjectStripper::stripAttributes(FAttributes& attributes, CmHashTable& seen)
 {
-    for (int i = attributes.total() - 1; i >= 0; i--)
-    {
-        if (!stripValue(*attributes.entryAt(i), seen))
+    for (int i = 0; i < attributes.total();)
+        if (stripValue(*attributes.entryAt(i), seen))
+            i++;
+        else
             attributes.removeEntryAt(i);
-    }
 }
 
 bool FCmObjectStripper::stripValue(FAttributeValue& value, CmHashTable& seen)
@@ -64,13 +64,14 @@ bool FCmObjectStripper::stripValue(FAttributeValue& value, CmHashTable& seen)
 
 void FCmObjectStripper::stripList(FObjectList& list, CmHashTable& seen)
 {
-    for (int i = list.total() - 1; i >= 0; i--)
+    for (int i = 0; i < list.total();)
     {
-        if (isPlainData(list.at(i)))
-            continue;
-        auto placeholder = adopt(stripObject(list.at(i), seen));
+        const bool isPlain = isPlainData(list.at(i));
+        auto placeholder = isPlain ? nullptr : adopt(stripObject(list.at(i), seen));
         if (placeholder)
             list.replaceAt(i, placeholder);
+        if (placeholder || isPlain)
+            i++;
         else
             list.removeAt(i);
     }
@@ -90,7 +91,10 @@ FXmlObject* FCmObjectStripper::stripObject(CmObject* object, CmHashTable& seen)
         waiting.push_back(instance);
         linker.addInstance(instance);
         if (!holder)
+        {
+            linker.addRoot(instance);
             return instance.take();
+        }
     }
     // In what an object stores, all places are references: these may form circles, which the linker sees to.
     linker.addReference(reference, holder);

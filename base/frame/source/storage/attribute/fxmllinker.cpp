@@ -106,7 +106,11 @@ void FXmlLinker::link()
     const auto byHolder = [](const Link& a, const Link& b) { return std::less<>()(a.holder, b.holder); };
     std::stable_sort(links.begin(), links.end(), byHolder);
     Walk walk(links);
-    // What stands in no object comes first, since null does, and is on no circle.
+    // What stands in the tree itself comes first: the references that lead away from there count, so that a circle
+    // is held by the tree.
+    for (FXmlInstance* root : roots)
+        walk.start(root);
+    walk.start(nullptr);
     for (const Link& link : links)
         walk.start(link.holder);
 }

@@ -18,6 +18,8 @@ public:
     /// `holder` is the object in whose tree the reference stands; null where it stands in none. Both are held until
     /// the linker goes.
     void addReference(FXmlReference* reference, FXmlInstance* holder);
+    /// An object that stands itself in the tree, without a reference. Borrowed.
+    void addRoot(FXmlInstance* instance) { roots.push_back(instance); }
     FXmlInstance* lookup(uint64 id) const;
     /// Gives each reference its target. One to an unknown number stays empty, which is no error.
     void link();
@@ -33,4 +35,5 @@ private:
 
     CmHashTable instances;
     std::vector<Link> links;
+    std::vector<FXmlInstance*> roots;
 };
