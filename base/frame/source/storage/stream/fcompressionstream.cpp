@@ -132,7 +132,7 @@ int64 FCompressionStream::writeRaw(const void* source, int64 count)
 void FCompressionStream::readAway(int64 count)
 {
     char byte;
-    while (count > 0 && readRaw(&byte, 1) == 1)
+    while (decompressor && count > 0 && readRaw(&byte, 1) == 1)
         count--;
 }
 

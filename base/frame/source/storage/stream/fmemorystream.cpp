@@ -17,6 +17,12 @@ int64 sum(int64 a, int64 b)
 {
     return static_cast<int64>(static_cast<uint64>(a) + static_cast<uint64>(b));
 }
+
+int64 wholePages(int64 bytes)
+{
+    constexpr int64 kMax = std::numeric_limits<int64>::max();
+    return bytes > kMax - kPage ? kMax : ((bytes - 1) & -kPage) + kPage;
+}
 } // namespace
 
 FMemoryStream::FMemoryStream(void* memory, int64 length)
@@ -75,8 +81,7 @@ bool FMemoryStream::setSize(int64 newSize)
         cursor = 0;
         return true;
     }
-    const int64 wanted = std::max(newSize, allocated);
-    if (wanted > std::numeric_limits<int64>::max() - kPage || !reallocate(((wanted - 1) & -kPage) + kPage))
+    if (!reallocate(wholePages(std::max(newSize, allocated))))
     {
         allocationError = true;
         return false;
@@ -140,7 +145,7 @@ int64 FMemoryStream::writeRaw(const void* source, int64 count)
 
 int64 FMemoryStream::readRaw(void* target, int64 count)
 {
-    if (!data || cursor < 0 || count < 1)
+    if (!data || !target || cursor < 0 || count < 1)
         return 0;
     if (cursor >= size)
     {
@@ -228,7 +233,7 @@ bool FMemoryStream::read(FStream& from, uint32 count)
 {
     const int64 oldSize = size;
     const int64 end = sum(cursor, count);
-    if (cursor < 0 || end < cursor || (end > size && !setSize(end)))
+    if (cursor < 0 || end < cursor || (end > size && !includeEnd(end)))
         return false;
     auto* memory = FCast(FMemoryStream, &from);
     if (!memory)
