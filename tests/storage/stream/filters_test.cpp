@@ -3,15 +3,29 @@
 #include "storage/stream/fblockstreamreader.h"
 #include "storage/stream/fbufferedstream.h"
 #include "storage/stream/fbufferstream.h"
+#include "storage/stream/ffilestream.h"
 #include "storage/stream/fstreamproxy.h"
 #include "streamfixture.h"
 
 #include <gtest/gtest.h>
 
+#include <cstdlib>
 #include <random>
+#include <unistd.h>
 
 namespace
 {
+/// A file of its own without a name.
+IPtr<FFileStream> temporaryFile()
+{
+    char name[] = "/tmp/filterstestXXXXXX";
+    const int descriptor = mkstemp(name);
+    unlink(name);
+    auto file = adopt(new FFileStream(kFileReadWrite));
+    EXPECT_TRUE(file->attach(descriptor, "wb+", 0));
+    return file;
+}
+
 /// Does the same random things to a stream and to a plain memory stream; both must tell the same.
 void expectToActAlike(FStream& stream, FMemoryStream& model, unsigned seed)
 {
@@ -109,6 +123,38 @@ TEST(FBufferedStream, MovesWholeBlocksAndKeepsSmallChangesBack)
     EXPECT_EQ(readFrom(stream, 4), "bcyy");
     stream.seek(40, kSeekStart);
     EXPECT_EQ(bytesOf(*inner), std::string(20, 'y') + "abc" + std::string(25, 'y'));
+}
+
+TEST(FBufferedStream, LeavesAFileAtItsTrueLength)
+{
+    auto file = temporaryFile();
+    auto other = temporaryFile();
+    {
+        FBufferedStream stream(file, 4096, true, nullptr);
+        writeTo(stream, "0123456789");
+        stream.flush();
+        EXPECT_EQ(file->getEof(), 4096);
+        stream.setStream(other);
+        EXPECT_EQ(file->getEof(), 10);
+        writeTo(stream, "abc");
+    }
+    EXPECT_EQ(other->getEof(), 3);
+    other->rewind();
+    EXPECT_EQ(readFrom(*other, 10), "abc");
+}
+
+TEST(FStream, AFileStaysAtItsEndBehindTheLastLine)
+{
+    auto file = temporaryFile();
+    writeTo(*file, "first\nlast");
+    file->rewind();
+    CmBuffer line;
+    EXPECT_TRUE(file->readLine(line, false));
+    EXPECT_STREQ(line.str8(), "first");
+    EXPECT_TRUE(file->readLine(line, false));
+    EXPECT_STREQ(line.str8(), "last");
+    EXPECT_EQ(file->tell(), 10);
+    EXPECT_FALSE(file->readLine(line, false));
 }
 
 TEST(FBufferedStream, AReaderStaysInsideTheStream)
