@@ -7,6 +7,7 @@
 #include "storage/path/fnpath.h"
 #include "storage/stream/uprogresshook.h"
 
+#include <algorithm>
 #include <cerrno>
 
 namespace
@@ -181,12 +182,15 @@ int64 FFileStream::writeFile(const void* buffer, int64 count)
 int64 FFileStream::writeDescriptor(const void* buffer, int64 count)
 {
     preallocate(count);
+    const char* bytes = static_cast<const char*>(buffer);
+    int64 total = 0;
     int error = 0;
-    const int64 done = PlatformFiles::write(descriptor, buffer, count, error);
+    // The system may take less than it is given; only a second try tells why.
+    while (total < count && error == 0)
+        total += std::max<int64>(PlatformFiles::write(descriptor, bytes + total, count - total, error), 0);
     setFirstError(error);
-    if (done > 0)
-        filePosition += done;
-    return done;
+    filePosition += total;
+    return total > 0 || error == 0 ? total : -1;
 }
 
 // Room for more than is written now keeps the file in one piece. A disk that can't do it only loses that.

@@ -4,6 +4,8 @@
 #include "foundation/object/iptr.h"
 #include "storage/filesystem/ffilesystem.h"
 
+#include <string>
+
 class FFileType;
 class FNPath;
 class FUrl;
@@ -188,6 +190,7 @@ private:
                                int* error);
     FStream* openNative(FNPath& path, int flags, int* error);
     int makeFolders(const FNPath& path);
+    int makeLevel(const std::string& level);
     bool removeContent(const FNPath& folder);
     bool copyNative(FNPath& from, FNPath& to, UProgressHook* hook, int* error);
     bool copyTree(const FNPath& from, const FNPath& to, bool withFiles, UProgressHook* hook);

@@ -57,20 +57,26 @@ int FNFileSystem::makeFolders(const FNPath& path)
     for (size_t end = whole.find('/', 1);; end = whole.find('/', end + 1))
     {
         const std::string level = whole.substr(0, end);
-        if (PlatformFiles::look(level).kind != Kind::kFolder)
-        {
-            FNPath made(FPath::kFolder);
-            made.fromPlatformPath(level.c_str());
-            const int error = PlatformFiles::makeFolder(level, isPrivate(made));
-            // Another process may have been quicker.
-            if (error != 0 && PlatformFiles::look(level).kind != Kind::kFolder)
-                return error;
-            if (error == 0)
-                onFileSystemChange(FileSystemChange::kWritten, &made, nullptr);
-        }
+        if (const int error = makeLevel(level))
+            return error;
         if (end == std::string::npos)
             return 0;
     }
+}
+
+int FNFileSystem::makeLevel(const std::string& level)
+{
+    const Kind kind = PlatformFiles::look(level).kind;
+    if (kind != Kind::kMissing)
+        return kind == Kind::kFolder ? 0 : ENOTDIR;
+    FNPath made(FPath::kFolder);
+    made.fromPlatformPath(level.c_str());
+    const int error = PlatformFiles::makeFolder(level, isPrivate(made));
+    // Another process may have been quicker.
+    if (error != 0)
+        return PlatformFiles::look(level).kind == Kind::kFolder ? 0 : error;
+    onFileSystemChange(FileSystemChange::kWritten, &made, nullptr);
+    return 0;
 }
 
 bool FNFileSystem::removeDir(FPath* path, bool recursive)
