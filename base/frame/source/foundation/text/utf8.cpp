@@ -19,46 +19,58 @@ bool isSurrogate(unsigned character)
     return (character & 0xF800) == 0xD800;
 }
 
-/// Takes one character of 2 to 4 bytes. Gives the number of bytes; 0 where `text` doesn't begin with one.
-unsigned decodeCharacter(const Byte* text, std::size_t rest, unsigned& character)
+// Each takes one character of its number of bytes at `in`, if one stands there, and steps behind it.
+
+bool takeTwo(const Byte*& in, const Byte* end, char16*& out)
 {
-    const unsigned lead = text[0];
-    if (lead < 0xE0)
-    {
-        if (lead < 0xC2 || rest < 2)
-            return 0;
-        const unsigned a = continuation(text[1]);
-        character = (lead & 0x1F) << 6 | a;
-        return a < 64 ? 2 : 0;
-    }
-    if (lead < 0xF0)
-    {
-        if (rest < 3)
-            return 0;
-        const unsigned a = continuation(text[1]);
-        const unsigned b = continuation(text[2]);
-        character = (lead & 0x0F) << 12 | a << 6 | b;
-        return (a | b) < 64 && character >= 0x800 && !isSurrogate(character) ? 3 : 0;
-    }
-    if (lead > 0xF4 || rest < 4)
-        return 0;
-    const unsigned a = continuation(text[1]);
-    const unsigned b = continuation(text[2]);
-    const unsigned c = continuation(text[3]);
-    character = (lead & 0x07) << 18 | a << 12 | b << 6 | c;
-    return (a | b | c) < 64 && character >= 0x10000 && character <= 0x10FFFF ? 4 : 0;
+    if (in[0] < 0xC2 || end - in < 2)
+        return false;
+    const unsigned a = continuation(in[1]);
+    if (a >= 64)
+        return false;
+    *out++ = static_cast<char16>((in[0] & 0x1F) << 6 | a);
+    in += 2;
+    return true;
 }
 
-char16* putCharacter(char16* out, unsigned character)
+bool takeThree(const Byte*& in, const Byte* end, char16*& out)
 {
-    if (character < 0x10000)
-    {
-        *out++ = static_cast<char16>(character);
-        return out;
-    }
+    if (end - in < 3)
+        return false;
+    const unsigned a = continuation(in[1]);
+    const unsigned b = continuation(in[2]);
+    const unsigned character = (in[0] & 0x0Fu) << 12 | a << 6 | b;
+    if ((a | b) >= 64 || character < 0x800 || isSurrogate(character))
+        return false;
+    *out++ = static_cast<char16>(character);
+    in += 3;
+    return true;
+}
+
+bool takeFour(const Byte*& in, const Byte* end, char16*& out)
+{
+    if (end - in < 4)
+        return false;
+    const unsigned a = continuation(in[1]);
+    const unsigned b = continuation(in[2]);
+    const unsigned c = continuation(in[3]);
+    const unsigned character = (in[0] & 0x0Fu) << 18 | a << 12 | b << 6 | c;
+    if ((a | b | c) >= 64 || character < 0x10000 || character > 0x10FFFF)
+        return false;
     *out++ = static_cast<char16>(0xD7C0 + (character >> 10));
     *out++ = static_cast<char16>(0xDC00 + (character & 0x3FF));
-    return out;
+    in += 4;
+    return true;
+}
+
+bool takeCharacter(const Byte*& in, const Byte* end, char16*& out)
+{
+    const unsigned lead = *in;
+    if (lead < 0xE0)
+        return takeTwo(in, end, out);
+    if (lead < 0xF0)
+        return takeThree(in, end, out);
+    return lead < 0xF5 && takeFour(in, end, out);
 }
 
 /// Whole blocks let the compiler use wide registers.
@@ -71,20 +83,22 @@ bool isAsciiBlock(const Element* text)
     return bits < 0x80;
 }
 
-/// Copies the characters below 128 at both places and steps behind them.
+/// Copies the characters below 128 at both places and steps behind them. Most runs between other characters are
+/// short: only a run that has shown some length is worth a look at blocks.
 template <class From, class To>
 void copyAscii(const From*& in, const From* end, To*& out)
 {
-    while (end - in >= kBlock && isAsciiBlock(in))
+    for (unsigned i = 0; i < kBlock; ++i)
     {
+        if (in == end || *in >= 0x80)
+            return;
+        *out++ = static_cast<To>(*in++);
+    }
+    for (; end - in >= kBlock && isAsciiBlock(in); in += kBlock, out += kBlock)
         for (unsigned i = 0; i < kBlock; ++i)
             out[i] = static_cast<To>(in[i]);
-        in += kBlock;
-        out += kBlock;
-    }
-    while (in < end && *in < 0x80)
-        *out++ = static_cast<To>(*in++);
 }
+
 /// Writes the character above 127 at `in` and steps behind it.
 Byte* encodeCharacter(const char16*& in, const char16* end, Byte* out, char loss)
 {
@@ -126,12 +140,11 @@ unsigned decodeUtf8(const char* text, unsigned length, char16* result, char16 lo
         if (*in < 0x80)
             copyAscii(in, end, out);
         while (in < end && *in >= 0x80)
-        {
-            unsigned character = 0;
-            const unsigned taken = decodeCharacter(in, static_cast<std::size_t>(end - in), character);
-            out = putCharacter(out, taken == 0 ? loss : character);
-            in += taken == 0 ? 1 : taken;
-        }
+            if (!takeCharacter(in, end, out))
+            {
+                *out++ = loss;
+                ++in;
+            }
     }
     return static_cast<unsigned>(out - result);
 }
