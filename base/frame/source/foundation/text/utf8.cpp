@@ -28,7 +28,7 @@ bool takeTwo(const Byte*& in, const Byte* end, char16*& out)
     const unsigned a = continuation(in[1]);
     if (a >= 64)
         return false;
-    *out++ = static_cast<char16>((in[0] & 0x1F) << 6 | a);
+    *out++ = static_cast<char16>((in[0] & 0x1Fu) << 6 | a);
     in += 2;
     return true;
 }
