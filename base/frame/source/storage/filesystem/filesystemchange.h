@@ -28,5 +28,5 @@ private:
     int32 kind;
     IPtr<FNPath> path;
     IPtr<FNPath> newPath;
-    int32 reserved = 0;
+    [[maybe_unused]] int32 reserved = 0;
 };
