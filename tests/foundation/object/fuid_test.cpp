@@ -153,7 +153,7 @@ TEST(CmUID, ShortStringCutsBitsFromTheLeastSignificantOn)
 
 TEST(CmUID, IsComparedByItsBytes)
 {
-    const CmUID one(kSample), same(kSample), greater(FUID(1, 0, 0, 0)), copied(one);
+    const CmUID one(kSample), same(kSample), greater(FUID(0xF0000000, 0, 0, 0)), copied(one);
     const CmObject other;
     EXPECT_TRUE(one.isEqual(&same));
     EXPECT_TRUE(one.isEqual(&copied));

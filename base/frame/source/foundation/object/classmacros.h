@@ -14,8 +14,8 @@
 //   DECLARE_ABSTRACT_CLASS   type test and descriptor, but neither copy nor maker         (DEFINE_ABSTRACT_CLASS)
 //
 // A declaration stands first in its class and leaves the access at `public`. Its definition stands in the class's
-// source. `Base` is the direct base through which the class descends from FObject; naming another one, or copying
-// the line from another class, does not compile. Classes that are stored in a changed form since their first
+// source. `Base` is the direct base through which the class descends from FObject; naming another one, in either
+// place, or copying the line from another class does not compile. Classes that are stored in a changed form since their first
 // version are defined by DEFINE_CLASS_VERSION.
 
 /// What the check of a declared base hands around; never made.
@@ -56,6 +56,7 @@ FClassTag<void> fNearestDeclaredClass(const void*, FDeclaredAs<void>);
 private:                                                                                                     \
     FCHECK_BASE_(Class, Base)                                                                                \
 public:                                                                                                      \
+    using FDeclaredBase = Base;                                                                              \
     const char* isA() const override                                                                         \
     {                                                                                                        \
         return #Class;                                                                                       \
@@ -98,11 +99,16 @@ public:                                                                         
     DECLARE_DESCRIBED_CLASS(Class, Base)                                                                     \
     static FUnknown* __fCreate();
 
+#define FCHECK_DEFINITION_(Class, Base)                                                                      \
+    static_assert(std::is_same_v<Class::FDeclaredBase, Base>, #Base " is not the declared base of " #Class);
+
 #define DEFINE_ABSTRACT_CLASS(Class, Base)                                                                   \
+    FCHECK_DEFINITION_(Class, Base)                                                                          \
     MetaClass Class::__fClass(#Class, nullptr, nullptr, &Base::__fClass, 0);
 #define DEFINE_DESCRIBED_CLASS(Class, Base) DEFINE_ABSTRACT_CLASS(Class, Base)
 
 #define DEFINE_CLASS_VERSION(Class, Base, version)                                                           \
+    FCHECK_DEFINITION_(Class, Base)                                                                          \
     MetaClass Class::__fClass(#Class, &Class::__fCreate, nullptr, &Base::__fClass, version);                 \
     FUnknown* Class::__fCreate()                                                                             \
     {                                                                                                        \

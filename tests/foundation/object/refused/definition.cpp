@@ -1,0 +1,8 @@
+#include "foundation/object/cmuid.h"
+
+class Derived : public CmUID
+{
+    DECLARE_CLASS(Derived, CmUID)
+};
+
+DEFINE_CLASS(Derived, CmObject)

@@ -1,0 +1,6 @@
+#include "foundation/object/cmuid.h"
+
+class Derived : public CmUID
+{
+    DECLARE_CLASS(Derived, CmObject)
+};
