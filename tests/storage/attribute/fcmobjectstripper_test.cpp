@@ -81,7 +81,7 @@ TEST_F(Stripper, CirclesAreMadeAgainAndNeverLeak)
 
 TEST_F(Stripper, LongChainsDoNotExhaustTheStack)
 {
-    constexpr int length = 200000;
+    constexpr int length = 50000;
     FAttributes tree;
     std::vector<IPtr<StoredNode>> chain;
     for (int i = 0; i < length; i++)
