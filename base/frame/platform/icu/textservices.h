@@ -30,7 +30,6 @@ public:
     bool parseTime(const char16* text, TextTime& result) override;
 
     void getLocalNow(TextDate& date, TextTime& time) override;
-    int getZoneOffset() override;
     bool hasDaylightSaving() override;
 
     void getPreferredLanguages(String& result) override;

@@ -82,13 +82,6 @@ void IcuTextServices::getLocalNow(TextDate& date, TextTime& time)
     time = {now.tm_hour, now.tm_min, now.tm_sec};
 }
 
-int IcuTextServices::getZoneOffset()
-{
-    const std::tm winter = localNoonInMonth(0);
-    const std::tm standard = winter.tm_isdst > 0 ? localNoonInMonth(6) : winter;
-    return static_cast<int>(standard.tm_gmtoff);
-}
-
 bool IcuTextServices::hasDaylightSaving()
 {
     return localNoonInMonth(0).tm_isdst > 0 || localNoonInMonth(6).tm_isdst > 0;

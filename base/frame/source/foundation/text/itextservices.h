@@ -66,9 +66,7 @@ public:
     // The clock on the wall
     /// The date and time now, in the local zone with its daylight saving.
     virtual void getLocalNow(TextDate& date, TextTime& time) = 0;
-    /// Seconds that the local zone is ahead of Greenwich by its standard time, without daylight saving.
-    virtual int getZoneOffset() = 0;
-    /// Whether the local zone has daylight saving in these years.
+    /// Whether the local zone has daylight saving this year.
     virtual bool hasDaylightSaving() = 0;
 
     // The user
