@@ -275,7 +275,8 @@ TEST_F(FNFileSystemTest, TimesAndSizes)
     const time_t now = time(nullptr);
     tm parts = {};
     gmtime_r(&now, &parts);
-    const CmDate today(parts.tm_mday, parts.tm_mon + 1, parts.tm_year + 1900);
+    const CmDate today(static_cast<unsigned>(parts.tm_mday), static_cast<unsigned>(parts.tm_mon + 1),
+                       static_cast<unsigned>(parts.tm_year + 1900));
     const CmTime expected(today, static_cast<unsigned>(parts.tm_hour), static_cast<unsigned>(parts.tm_min),
                           static_cast<unsigned>(parts.tm_sec), false);
     EXPECT_LE(expected.getSeconds() - modified.getSeconds(), 600u);

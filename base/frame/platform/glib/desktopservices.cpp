@@ -51,7 +51,8 @@ bool askFileManager(const char* uri)
 
 bool DesktopServices::openUrl(const char* url)
 {
-    return g_app_info_launch_default_for_uri(url, nullptr, nullptr);
+    return g_uri_is_valid(url, G_URI_FLAGS_PARSE_RELAXED, nullptr) &&
+           g_app_info_launch_default_for_uri(url, nullptr, nullptr);
 }
 
 bool DesktopServices::openFile(const char* path)

@@ -13,8 +13,8 @@ PlatformFiles::Trouble PlatformFiles::meaningOf(int error)
         return Trouble::kNotFound;
     case EIO:
         return Trouble::kReadWrite;
-    // Other platforms number a name that is too long 63; the number that it has here means streams, which no file
-    // operation reports, so files with errors from elsewhere are understood too.
+    // Other platforms number a name that is too long 63; the number that it has here means streams, which no
+    // file operation reports, so files with errors from elsewhere are understood too.
     case ENAMETOOLONG:
     case ENOSR:
         return Trouble::kNameTooLong;

@@ -22,7 +22,8 @@ int accessOf(const PlatformFiles::Opening& how)
 
 int flagsOf(const PlatformFiles::Opening& how)
 {
-    // A pipe without anybody at its other end would block the program for ever; plain files don't mind the flag.
+    // A pipe without anybody at its other end would block the program for ever; plain files don't mind the
+    // flag.
     int flags = accessOf(how) | O_CLOEXEC | O_NONBLOCK | O_NOCTTY;
     if (how.create)
         flags |= O_CREAT;

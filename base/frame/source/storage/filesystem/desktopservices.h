@@ -1,7 +1,7 @@
 #pragma once
 
-/// What the desktop does with files and URLs; each gives false where it can't. Texts are bytes as the platform takes
-/// them. Defined by the platform. Main thread.
+/// What the desktop does with files and URLs; each gives false where it can't. Texts are bytes as the
+/// platform takes them. Defined by the platform. Main thread.
 namespace DesktopServices
 {
 /// Opens a URL with the default program of its scheme. The URL is handed on byte for byte.

@@ -12,8 +12,8 @@ class UProgressHook;
 
 /// The contract of everything that holds files: the disk, an archive, a part of either.
 ///
-/// Operations give false, null or -1 where they fail; an `error`, where given, then takes the system's number, and
-/// is left alone otherwise. The base class can do nothing but what the others amount to.
+/// Operations give false, null or -1 where they fail; an `error`, where given, then takes the system's
+/// number, and is left alone otherwise. The base class can do nothing but what the others amount to.
 class FFileSystem : public CmObject
 {
     DECLARE_ABSTRACT_CLASS(FFileSystem, CmObject)
@@ -46,7 +46,8 @@ class FFileSystem : public CmObject
     virtual bool makeValidName(FString& name, char16 replacement, bool trim);
     /// Over the content of a folder; the caller deletes it by `release`.
     virtual FFileIterator* newIterator(const FPath* path, bool recursive);
-    /// Adds up the files, and with `withFolders` the folders too, and their bytes in `bytes`, which may be null.
+    /// Adds up the files, and with `withFolders` the folders too, and their bytes in `bytes`, which may be
+    /// null.
     virtual int64 countFiles(const FPath* path, bool recursive, bool withFolders, int64* bytes);
 
     /// What `makeValidName` does for names that the disk takes.

@@ -6,12 +6,13 @@
 #include <string>
 #include <vector>
 
-/// Walks one folder on disk. The entries are read by `first`, so that files may be made and removed on the way.
-/// One thread at a time.
+/// Walks one folder on disk. The entries are read by `first`, so that files may be made and removed on the
+/// way. One thread at a time.
 class FNFileIterator : public IFileIteratorImpl
 {
 public:
-    /// With `skipHidden`, entries that are hidden and packages are left out. A folder that can't be read is empty.
+    /// With `skipHidden`, entries that are hidden and packages are left out. A folder that can't be read is
+    /// empty.
     explicit FNFileIterator(const FNPath* folder, bool skipHiddenEntries = false);
 
     void first() override;

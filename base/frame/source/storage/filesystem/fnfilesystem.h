@@ -10,14 +10,14 @@ class FFileType;
 class FNPath;
 class FUrl;
 
-/// The disk. All access to files goes through the one object `gFileSystem`, which reports each change to the watcher.
+/// The disk. All access to files goes through the one object `gFileSystem`, which reports each change to the
+/// watcher.
 ///
-/// Paths may also be URLs of the protocol "file", and paths into archives are handed on to whoever serves them. What
-/// is made below the user folder is for the owner only (files 0600, folders 0700), since secrets are kept there, and
-/// files written there are forced to the disk when they are closed, so that renaming one over its forerunner never
-/// loses both.
-/// Without a lock of its own: thread-safe but for `lastPath`, the signature and the listeners, which belong to the
-/// main thread.
+/// Paths may also be URLs of the protocol "file", and paths into archives are handed on to whoever serves
+/// them. What is made below the user folder is for the owner only (files 0600, folders 0700), since secrets
+/// are kept there, and files written there are forced to the disk when they are closed, so that renaming one
+/// over its forerunner never loses both. Without a lock of its own: thread-safe but for `lastPath`, the
+/// signature and the listeners, which belong to the main thread.
 class FNFileSystem : public FFileSystem
 {
     DECLARE_TYPE(FNFileSystem, FFileSystem)
@@ -83,8 +83,8 @@ class FNFileSystem : public FFileSystem
     // Folders
     bool dirExists(FNPath* path);
     bool isFolderEmpty(FNPath* path);
-    /// Removes the empty folders below `path`, and those that become empty by that, but not `path` itself. False
-    /// where one could not be removed.
+    /// Removes the empty folders below `path`, and those that become empty by that, but not `path` itself.
+    /// False where one could not be removed.
     bool removeEmptyFolders(FNPath* path);
     /// Makes the folders below `from` again below `to`.
     bool copyFolderStructure(FNPath* from, FNPath* to);
@@ -119,19 +119,22 @@ class FNFileSystem : public FFileSystem
     bool checkResolveLink(FNPath* path);
 
     // Names
-    /// Like `makeValidName`, and makes the name one that a disk takes: not empty, no "." or "..", 255 bytes at most.
+    /// Like `makeValidName`, and makes the name one that a disk takes: not empty, no "." or "..", 255 bytes
+    /// at most.
     bool makeValidFileName(FString& name, char16 replacement, bool trim);
     static bool makeValidPath(FString& text, char16 replacement);
-    /// Composes the name and cuts it to the 255 bytes that a disk takes, in front of the extension. True if changed.
+    /// Composes the name and cuts it to the 255 bytes that a disk takes, in front of the extension. True if
+    /// changed.
     static bool makeSystemName(FString& name);
     /// Takes the text of a URL of the protocol "file".
     static bool pathFromURL(const char16* url, FNPath& result);
-    /// Whether the text is the root. Volumes are mounted below it here, so their places are folders like others.
+    /// Whether the text is the root. Volumes are mounted below it here, so their places are folders like
+    /// others.
     static bool isRoot(const char16* text);
 
     // Drives
-    /// Adds a new FNPath for each drive of the kinds in `mask`, which the container is to take over. Gives their
-    /// number.
+    /// Adds a new FNPath for each drive of the kinds in `mask`, which the container is to take over. Gives
+    /// their number.
     int getDrives(CmContainer& result, int mask);
     /// One of DriveType.
     int getDriveType(FNPath* path);
@@ -147,8 +150,8 @@ class FNFileSystem : public FFileSystem
     bool getPhysicalDiskUniqueIDString(FPath* path, FString& result);
 
     // Changes
-    /// Tells the watcher of a change; `kind` is one of FileSystemChange, `newPath` may be null. Does nothing without
-    /// a messenger or a running watcher, and for excluded paths. Thread-safe.
+    /// Tells the watcher of a change; `kind` is one of FileSystemChange, `newPath` may be null. Does nothing
+    /// without a messenger or a running watcher, and for excluded paths. Thread-safe.
     void onFileSystemChange(int kind, const FNPath* path, const FNPath* newPath);
     /// `listener` gets the messages "VolMount" and "VolUnmount", with the root as "kRootPath". Not counted.
     void subscribeToMountEvent(CmObject* listener);

@@ -298,8 +298,8 @@ int FNMonitor::notify(FMessage* message)
     return 1;
 }
 
-// A change is that of a folder's content, so the folder itself counts as much as those above it. Listeners may come
-// and go while they are told.
+// A change is that of a folder's content, so the folder itself counts as much as those above it. Listeners
+// may come and go while they are told.
 void FNMonitor::tell(const FileSystemChange& change)
 {
     std::vector<IFileSystemListener*> told;

@@ -38,9 +38,9 @@ class FNListenerEntry : public CmObject
 
 /// Watches folders and tells listeners what changed in them or below them.
 ///
-/// The watching thread and the file system post their news as messages "PathChanged"; listeners hear of them on the
-/// main thread. Listeners aren't owned and must be removed before they go. Exclude filters are thread-safe; all else
-/// belongs to the main thread.
+/// The watching thread and the file system post their news as messages "PathChanged"; listeners hear of them
+/// on the main thread. Listeners aren't owned and must be removed before they go. Exclude filters are
+/// thread-safe; all else belongs to the main thread.
 class FNMonitor : public CmObject
 {
     DECLARE_TYPE(FNMonitor, CmObject)
@@ -63,8 +63,8 @@ class FNMonitor : public CmObject
     bool isRunning() const { return running; }
 
     // Listeners
-    /// `listener` hears of changes in `path` and below; the folder itself is watched, folders below it are watched by
-    /// `addPath`. False where it is no folder that can be watched.
+    /// `listener` hears of changes in `path` and below; the folder itself is watched, folders below it are
+    /// watched by `addPath`. False where it is no folder that can be watched.
     bool registerPath(IFileSystemListener* listener, const FNPath* path);
     /// Takes the listener off all its paths.
     void removeRegistry(IFileSystemListener* listener);
@@ -79,8 +79,8 @@ class FNMonitor : public CmObject
     bool isPathExcluded(const char16* fullPath) const;
     /// A folder also counts as the beginning of its content, with a delimiter at its end.
     bool isPathExcluded(const FNPath& path) const;
-    /// The pattern that fits `path` itself or, with `withContent`, a folder and all below it: "/a/b" or "/a/b/" and a
-    /// star.
+    /// The pattern that fits `path` itself or, with `withContent`, a folder and all below it: "/a/b" or
+    /// "/a/b/" and a star.
     static void prepareExcludeFilter(const FPath* path, bool withContent, FString& pattern);
 
     /// Posts a change in a folder to this monitor, if there is a messenger. Thread-safe.

@@ -119,8 +119,8 @@ FFileType* FNPath::typeOfContent()
     return found;
 }
 
-// Files have no code and no flags of their own here: a name that begins with a dot is hidden, and a folder with the
-// right extension is a bundle.
+// Files have no code and no flags of their own here: a name that begins with a dot is hidden, and a folder
+// with the right extension is a bundle.
 void FNPath::askPlatform()
 {
     const PlatformFiles::Facts facts = PlatformFiles::look(DiskName::find(*this));

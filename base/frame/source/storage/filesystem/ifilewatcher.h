@@ -17,11 +17,12 @@ public:
     };
 
     virtual ~IFileWatcher() = default;
-    /// The number under which the folder's changes are told; the same one for a folder that is watched already. -1
-    /// where it can't be watched.
+    /// The number under which the folder's changes are told; the same one for a folder that is watched
+    /// already. -1 where it can't be watched.
     virtual int add(const char* folder) = 0;
     virtual void remove(int number) = 0;
-    /// Waits for the next happening, `timeoutMs` at most or, if negative, for ever. `number` takes the folder's.
+    /// Waits for the next happening, `timeoutMs` at most or, if negative, for ever. `number` takes the
+    /// folder's.
     virtual Happening wait(int timeoutMs, int& number) = 0;
     /// Makes `wait` return, also the next one.
     virtual void wake() = 0;

@@ -47,8 +47,8 @@ bool isTaken(const std::string& path);
 
 // Open files. `open` gives a descriptor, or -1 and the error.
 int open(const std::string& path, const Opening& how, int& error);
-/// The file takes the descriptor over; null where that fails. `mode` is that of the standard library and must fit
-/// the opening; it truncates nothing here.
+/// The file takes the descriptor over; null where that fails. `mode` is that of the standard library and must
+/// fit the opening; it truncates nothing here.
 std::FILE* openBuffered(int descriptor, const char* mode, std::size_t bufferSize);
 int close(int descriptor);
 /// These give the number of bytes, or -1 with the error in `error`.

@@ -6,9 +6,9 @@
 
 /// A location in the local file system.
 ///
-/// Texts are normalised to the composed form; where a file has its name in another form on disk, the file system
-/// finds it all the same. Names on disk are bytes: a byte that isn't part of valid UTF-8 travels as the lone
-/// surrogate 0xDC80 plus its low seven bits and goes back to disk as it was. One thread at a time.
+/// Texts are normalised to the composed form; where a file has its name in another form on disk, the file
+/// system finds it all the same. Names on disk are bytes: a byte that isn't part of valid UTF-8 travels as
+/// the lone surrogate 0xDC80 plus its low seven bits and goes back to disk as it was. One thread at a time.
 class FNPath : public FPath
 {
     DECLARE_CLASS(FNPath, FPath)
@@ -34,8 +34,9 @@ class FNPath : public FPath
     /// The place to which the relative path `relative` leads from `base`.
     FNPath(FNPath* base, FNPath* relative);
     explicit FNPath(IPath* other);
-    /// A file or folder below a standard folder; `subFolder` may hold several levels, or be null. With `create` the
-    /// folders are made. Where the folder isn't known, the path stays empty, so that nothing is taken for it by chance.
+    /// A file or folder below a standard folder; `subFolder` may hold several levels, or be null. With
+    /// `create` the folders are made. Where the folder isn't known, the path stays empty, so that nothing is
+    /// taken for it by chance.
     FNPath(const char16* newName, int standardFolder, int newType, const char16* subFolder, bool create);
     FNPath(const FNPath& other) = default;
     FNPath& operator=(const FNPath& other) = default;
@@ -55,12 +56,13 @@ class FNPath : public FPath
     /// | "a\b"    | "a/"   | "b"    |
     /// | "c:/x"   | "C:/"  | "x"    |
     bool fromPlatformPath(const void* utf8Text);
-    /// Writes the path's bytes and a terminator to `buffer`, of kPlatformBufferSize bytes. False, with an empty text of
-    /// two zero bytes, for a path of 1024 characters or more.
+    /// Writes the path's bytes and a terminator to `buffer`, of kPlatformBufferSize bytes. False, with an
+    /// empty text of two zero bytes, for a path of 1024 characters or more.
     bool toPlatformPath(void* buffer) const;
     /// The path's bytes, whatever their number.
     std::string platformPath() const;
-    /// The path as a URL of the protocol "file", with all but plain characters as %XX; false for a relative path.
+    /// The path as a URL of the protocol "file", with all but plain characters as %XX; false for a relative
+    /// path.
     bool createURL(FString& url) const;
     bool isRoot(const char16* text) const override;
     /// Whether the path begins at the root.
@@ -78,8 +80,8 @@ class FNPath : public FPath
     int32 getPlatformState() const { return platformState; }
 
     // Relative paths
-    /// This path becomes the way from the folder of `base` to `absolute`: "../b/c" for "/a/b/c" from "/a/x/". Where
-    /// they have nothing in common, it becomes `absolute`. False where an argument doesn't fit.
+    /// This path becomes the way from the folder of `base` to `absolute`: "../b/c" for "/a/b/c" from "/a/x/".
+    /// Where they have nothing in common, it becomes `absolute`. False where an argument doesn't fit.
     bool assignRelative(const FNPath* absolute, const FNPath* base);
     bool makeRelative(const FNPath* base);
     /// A new path for the caller; null for a path that is absolute already.
@@ -90,8 +92,8 @@ class FNPath : public FPath
     int countAscendLevels() const;
 
     // Standard folders
-    /// The folder part becomes a standard folder, or `subFolder` below it; the name stays. False where it doesn't
-    /// exist and isn't to be made, or nobody knows the folders. Touches the disk.
+    /// The folder part becomes a standard folder, or `subFolder` below it; the name stays. False where it
+    /// doesn't exist and isn't to be made, or nobody knows the folders. Touches the disk.
     bool getStandardFolder(int which, const char16* subFolder, bool create);
 
     // Storage

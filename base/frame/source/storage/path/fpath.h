@@ -74,8 +74,8 @@ class FPath : public CmObject, public IPath
     /// | "a.b c"    | none      | either        | -1     |
     /// | ".profile" | any       | either        | -1     |
     int getExtensionIndex(bool useFileType) const;
-    /// Gives a file the extension of its type. Without `replace` a name that ends in another extension keeps it and
-    /// the new one is appended. False for a folder, and where the type has no extension.
+    /// Gives a file the extension of its type. Without `replace` a name that ends in another extension keeps
+    /// it and the new one is appended. False for a folder, and where the type has no extension.
     virtual bool updateExtension(bool replace);
 
     // File type
@@ -85,17 +85,18 @@ class FPath : public CmObject, public IPath
     const FFileType& getKnownFileType() const { return fileType; }
     /// Also changes the extension of a file, if the new type has one.
     void setFileType(const FFileType& newType);
-    /// Finds the type by the extension or, with `lookIntoFile`, by the file's first bytes. False where none is found.
+    /// Finds the type by the extension or, with `lookIntoFile`, by the file's first bytes. False where none
+    /// is found.
     virtual bool detectFileType(bool lookIntoFile);
     static void toFrameworkFileType(const FFileTypeInfo& info, FFileType& result);
     static void fromFrameworkFileType(const FFileType& fileType, FFileTypeInfo& result);
 
     // Moving
-    /// The path becomes a child of itself. Beware: a delimiter is added to a folder part that has none, so that a
-    /// name alone, "a", becomes "/a/b".
+    /// The path becomes a child of itself. Beware: a delimiter is added to a folder part that has none, so
+    /// that a name alone, "a", becomes "/a/b".
     virtual bool descend(const char16* childName, int childType);
-    /// The path becomes its folder. False, with the path as it was, at a root and where the folder part of a relative
-    /// path has one component or none.
+    /// The path becomes its folder. False, with the path as it was, at a root and where the folder part of a
+    /// relative path has one component or none.
     virtual bool ascend();
     virtual bool isRootDir() const;
     virtual bool isRoot(const char16* text) const;
@@ -106,8 +107,8 @@ class FPath : public CmObject, public IPath
     virtual bool isCaseSensitive() const { return true; }
 
     // Unused names
-    /// Numbers the name until `fileSystem` has no such file: "take.wav", "take-01.wav", "take-02.wav". False, with the
-    /// path as it was, where all numbers up to 9999 are taken. Touches the disk.
+    /// Numbers the name until `fileSystem` has no such file: "take.wav", "take-01.wav", "take-02.wav". False,
+    /// with the path as it was, where all numbers up to 9999 are taken. Touches the disk.
     bool makeUnique(FFileSystem& fileSystem);
     /// The same in the global file system.
     virtual bool uniqueName();

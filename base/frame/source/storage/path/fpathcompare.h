@@ -4,8 +4,8 @@
 
 class FPath;
 
-/// The order of paths in a tree: what is in a folder comes right behind the folder, before a sibling that merely has a
-/// longer name. "a/", "a/b", "a.b" are in order.
+/// The order of paths in a tree: what is in a folder comes right behind the folder, before a sibling that
+/// merely has a longer name. "a/", "a/b", "a.b" are in order.
 class FPathCompare
 {
 public:

@@ -14,8 +14,8 @@ inline constexpr int kPathBufferSize = 1024;
 
 /// A location, as it crosses a component boundary.
 ///
-/// Each operation gives kPathOk, kPathFailed or, for a null argument, kPathInvalidArgument. A buffer for a text has
-/// kPathBufferSize characters; a text that is too long for it fails, with the buffer left empty.
+/// Each operation gives kPathOk, kPathFailed or, for a null argument, kPathInvalidArgument. A buffer for a
+/// text has kPathBufferSize characters; a text that is too long for it fails, with the buffer left empty.
 class IPath : public FUnknown
 {
 public:

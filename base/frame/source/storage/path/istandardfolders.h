@@ -5,8 +5,8 @@
 /// Where the folders of the program are; the application answers.
 ///
 /// Each operation gives a folder's full path, with or without a delimiter at its end, valid until the answer
-/// changes; null or empty where there is no such folder. Set once at start. Main thread for setting, thread-safe for
-/// asking.
+/// changes; null or empty where there is no such folder. Set once at start. Main thread for setting,
+/// thread-safe for asking.
 class IStandardFolders
 {
 public:

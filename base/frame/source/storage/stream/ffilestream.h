@@ -11,8 +11,8 @@ class FNPath;
 
 /// A file on disk. Made by the file system's `createFile` and `openFile`, ended by its `closeFile`.
 ///
-/// The stream keeps the first error of the system until it is cleared; what was written is safe only once `close`,
-/// or the file system's `closeFile`, has given true. One thread at a time.
+/// The stream keeps the first error of the system until it is cleared; what was written is safe only once
+/// `close`, or the file system's `closeFile`, has given true. One thread at a time.
 class FFileStream : public FStream, public ISizeableStream
 {
     DECLARE_TYPE(FFileStream, FStream)
@@ -39,13 +39,13 @@ class FFileStream : public FStream, public ISizeableStream
     int32 getSeekAlign() const { return seekAlign; }
 
     // Used by the file system
-    /// Takes over an open descriptor. With `fileMode`, that of a standard file, it is used through one with a buffer of
-    /// 16384 bytes. False where that fails, with the descriptor closed.
+    /// Takes over an open descriptor. With `fileMode`, that of a standard file, it is used through one with a
+    /// buffer of 16384 bytes. False where that fails, with the descriptor closed.
     bool attach(int newDescriptor, const char* fileMode, int32 alignment);
     /// The content is forced to the disk before the file is closed.
     void setSyncOnClose(bool state) { syncOnClose = state; }
-    /// Writes what is held back and closes. False where that or any transfer before it failed, `getFirstError` tells
-    /// why; true for a closed stream without an error. May be called again.
+    /// Writes what is held back and closes. False where that or any transfer before it failed,
+    /// `getFirstError` tells why; true for a closed stream without an error. May be called again.
     bool close();
 
     // Transfers

@@ -16,15 +16,16 @@ constexpr int32 fourCharCode(const char (&text)[5])
 
 /// What a file holds, in the words of several platforms at once.
 ///
-/// Two types are equal as soon as one word that both have is equal, in the order UTI, DOS extension, Mac type, Unix
-/// extension, MIME type; a word that differs doesn't decide. So equality isn't transitive, and types have no hash.
-/// Types that the program knows are registered during start-up, which isn't locked. A value; one thread at a time.
+/// Two types are equal as soon as one word that both have is equal, in the order UTI, DOS extension, Mac
+/// type, Unix extension, MIME type; a word that differs doesn't decide. So equality isn't transitive, and
+/// types have no hash. Types that the program knows are registered during start-up, which isn't locked. A
+/// value; one thread at a time.
 class FFileType : public CmObject
 {
     DECLARE_CLASS(FFileType, CmObject)
 
-    /// Tells a type by the first bytes of a file, of which there are `length`, 1024 at most; null where it doesn't
-    /// know them. The result lives as long as the program.
+    /// Tells a type by the first bytes of a file, of which there are `length`, 1024 at most; null where it
+    /// doesn't know them. The result lives as long as the program.
     using Identifier = FFileType* (*)(unsigned char* header, int length);
 
     FFileType() = default;
@@ -62,8 +63,8 @@ class FFileType : public CmObject
     static void registerTypeIdentifier(Identifier identify);
     /// The first registered type with this extension, case respected; null where there is none.
     static FFileType* getTypeByString(const char16* extension);
-    /// The type that the first identifier finds in the first 1024 bytes; null where none does or nothing can be
-    /// read. The stream stands at its start afterwards.
+    /// The type that the first identifier finds in the first 1024 bytes; null where none does or nothing can
+    /// be read. The stream stands at its start afterwards.
     static FFileType* getTypeByStream(FStream* stream);
 
     bool storeAttributes(FAttributes& attributes) const override;

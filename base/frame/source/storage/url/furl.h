@@ -15,8 +15,8 @@ class UrlMetaHandler;
 /// | http://h                   |      |          | h    | 80   |           |         |
 /// | file:///a/b                |      |          |      | 0    | /a/b      | b       |
 ///
-/// The parts of the path follow those of the URL. The handlers are registered during start-up, which isn't locked.
-/// One thread at a time.
+/// The parts of the path follow those of the URL. The handlers are registered during start-up, which isn't
+/// locked. One thread at a time.
 class FUrl : public FPath, public IUrl
 {
     DECLARE_CLASS(FUrl, FPath)
@@ -41,8 +41,8 @@ class FUrl : public FPath, public IUrl
     bool getUrl(FString& result) const;
     /// Replaces the file, as a text of a URL or with `encode` as a plain one.
     void setFile(const char16* text, bool encode);
-    /// Works on bytes in UTF-8: all but letters, digits and -./&+=?_~ become a "%" with lower-case digits, of which a
-    /// byte below 16 has but one.
+    /// Works on bytes in UTF-8: all but letters, digits and -./&+=?_~ become a "%" with lower-case digits, of
+    /// which a byte below 16 has but one.
     static void urlEncode(FString& text);
     /// A digit that is none counts as 0; "+" stays.
     static void urlDecode(FString& text);

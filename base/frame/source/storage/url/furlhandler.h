@@ -7,8 +7,8 @@ class FUrl;
 
 /// Transfers what a URL names. One per protocol is derived and registered with FUrl.
 ///
-/// The URL owns its handler, which therefore borrows the URL: it must not outlive it. One thread at a time, but for
-/// `cancel`.
+/// The URL owns its handler, which therefore borrows the URL: it must not outlive it. One thread at a time,
+/// but for `cancel`.
 class FUrlHandler : public CmObject
 {
     DECLARE_ABSTRACT_CLASS(FUrlHandler, CmObject)
