@@ -22,7 +22,7 @@ String textOf(const CmVariant& variant)
 CmVariant evaluate(int operation, const CmVariant& left, const CmVariant& right)
 {
     auto node = adopt(new CmVariantOperation(operation));
-    node->setOperands(adopt(new FVariantNode(left)), adopt(new FVariantNode(right)));
+    node->setOperands(adopt(new CmVariantConstant(left)), adopt(new CmVariantConstant(right)));
     return node->evaluate(nullptr);
 }
 
@@ -161,7 +161,7 @@ TEST(CmVariantOperation, IsEmptyWithoutAnOperand)
     {
         auto node = adopt(new CmVariantOperation(operation));
         EXPECT_TRUE(node->evaluate(nullptr).isEmpty());
-        node->setOperands(adopt(new FVariantNode(CmVariant(1))), nullptr);
+        node->setOperands(adopt(new CmVariantConstant(CmVariant(1))), nullptr);
         EXPECT_TRUE(node->evaluate(nullptr).isEmpty());
     }
 }

@@ -2,7 +2,7 @@
 
 #include "foundation/object/funknown.h"
 
-/// A calendar date as a component sees it. Each result is 0, or 2 for a null pointer.
+/// A calendar date as a component sees it. Each result is 0, or 2 for a null pointer. One thread at a time.
 class IDate : public FUnknown
 {
 public:
@@ -16,7 +16,7 @@ public:
 };
 
 /// A date that a component may change. Each result is 0, or 2 where the outcome would be no date; the date is then
-/// what it was.
+/// what it was. One thread at a time.
 class IDateModifier : public IDate
 {
 public:

@@ -3,6 +3,7 @@
 #include "foundation/object/funknown.h"
 
 /// A time of day as a component sees it, in local time. Each result is 0, or 2 for a null pointer.
+/// One thread at a time.
 class ITime : public FUnknown
 {
 public:

@@ -53,6 +53,10 @@ class FStream : public CmObject, public FStreamer, public virtual IBStream
     /// Reads the next line into `line`, terminated; the terminator doesn't count as filled. Every run of carriage
     /// returns and line feeds is one line end. With `trim`, tabs and blanks around the line are left out. False at
     /// the end of the stream.
+    ///
+    /// Beware: behind a last line without a line end, the stream is sought to -1. A file refuses that and stays at
+    /// its end, and a memory stream then stands before its start; but a filter that moves positions inside its
+    /// bounds begins anew.
     bool readLine(CmBuffer& line, bool trim);
     /// The characters as raw bytes in the host's order. Gives the number of bytes written.
     int64 writeString16(const char16* text, bool withTerminator);

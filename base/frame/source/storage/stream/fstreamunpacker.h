@@ -12,6 +12,8 @@ class FStreamUnpacker
 {
 public:
     explicit FStreamUnpacker(FStream* stream);
+    FStreamUnpacker(const FStreamUnpacker&) = delete;
+    FStreamUnpacker& operator=(const FStreamUnpacker&) = delete;
 
     FStream* getStream() const;
 

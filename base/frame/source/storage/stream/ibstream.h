@@ -8,7 +8,7 @@ inline constexpr int32 kStreamFailed = 1;
 inline constexpr int32 kStreamInvalidArgument = kResultInvalidArgument;
 inline constexpr int32 kStreamSizeNotChanged = 4;
 
-/// A stream of bytes as a component sees it.
+/// A stream of bytes as a component sees it. One thread at a time.
 class IBStream : public FUnknown
 {
 public:

@@ -2,7 +2,7 @@
 
 #include "foundation/object/funknown.h"
 
-/// A stream whose bytes stand in memory.
+/// A stream whose bytes stand in memory. One thread at a time.
 class IMemoryStream : public FUnknown
 {
 public:

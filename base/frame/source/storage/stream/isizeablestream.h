@@ -2,7 +2,7 @@
 
 #include "foundation/object/funknown.h"
 
-/// A stream whose size can be asked for and changed.
+/// A stream whose size can be asked for and changed. One thread at a time.
 class ISizeableStream : public FUnknown
 {
 public:

@@ -5,7 +5,8 @@
 /// Hears how far a long transfer has come, and may cancel it.
 ///
 /// A value counts bytes, divided by the value compression where totals are too great for whoever shows them.
-/// Whoever passes a hook keeps it alive; its operations are called by the thread that transfers.
+/// Whoever passes a hook keeps it alive; its operations are called by the thread that transfers, one
+/// thread at a time.
 class UProgressHook
 {
 public:

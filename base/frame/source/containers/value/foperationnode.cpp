@@ -1,4 +1,4 @@
-#include "containers/value/cmvariantoperation.h"
+#include "containers/value/foperationnode.h"
 
 #include "foundation/object/fvariant.h"
 #include "foundation/text/string.h"
@@ -115,7 +115,7 @@ bool FOperationNode::evaluateOperands(void* context, CmVariant& left, CmVariant&
     return true;
 }
 
-CmVariant FVariantNode::evaluate(void*)
+CmVariant CmVariantConstant::evaluate(void*)
 {
     return value;
 }
