@@ -210,8 +210,10 @@ TEST_F(FNMonitorTest, MountEventsGoToSubscribers)
     files->subscribeToMountEvent(&mounts);
     FNPath volume(u"/media/user/stick", FPath::kFolder);
     files->onMountEvent("VolMount", &volume);
+    files->onMountEvent("VolRename", &volume);
     files->unsubscribeFromMountEvent(&mounts);
     files->onMountEvent("VolUnmount", &volume);
+    messenger->deliverMessages();
     EXPECT_EQ(mounts.heard, "VolMount /media/user/stick");
 }
 } // namespace

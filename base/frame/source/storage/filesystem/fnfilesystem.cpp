@@ -16,6 +16,7 @@
 #include "storage/stream/ffilestream.h"
 
 #include <cerrno>
+#include <cstring>
 
 FNFileSystem* gFileSystem = nullptr;
 
@@ -25,6 +26,9 @@ using PlatformFiles::Kind;
 
 // The days from 1 January 1901, with which CmTime begins, to 1 January 1970.
 constexpr int64 kDaysToEpoch = 25202;
+
+constexpr const char* kMountEvents[] = {"VolMount", "VolUnmount"};
+constexpr const char* kRootPath = "kRootPath";
 
 CmTime timeOf(int64 secondsSince1970)
 {
@@ -51,6 +55,15 @@ IPtr<FFileSystem> archiveOf(const FPath* path)
 IPtr<FPath> insideArchive(const FPath& path)
 {
     return adopt(IArchiveLookup::instance()->getPath(path));
+}
+
+// The literal of a mount event, which a message may keep; null where it is none.
+const char* mountEventOf(const char* eventName)
+{
+    for (const char* known : kMountEvents)
+        if (eventName && strcmp(eventName, known) == 0)
+            return known;
+    return nullptr;
 }
 
 // A path takes the location of another of any kind.
@@ -383,15 +396,14 @@ void FNFileSystem::unsubscribeFromMountEvent(CmObject* listener)
 
 void FNFileSystem::onMountEvent(const char* eventName, FNPath* root)
 {
-    if (!gMessenger || !eventName || !root)
+    const char* type = mountEventOf(eventName);
+    if (!gMessenger || !type || !root)
         return;
-    // A listener may leave when it is told.
-    const CmLinkedList told(mountListeners);
-    for (int i = 0; i < told.total(); i++)
+    for (int i = 0; i < mountListeners.total(); i++)
     {
-        const IPtr<FMessage> message = adopt(new FMessage(eventName));
-        message->add("kRootPath", root, true);
-        gMessenger->sendMessage(told.at(i), message);
+        auto* message = new FMessage(type);
+        message->add(kRootPath, adopt(new FNPath(*root)), true);
+        gMessenger->postMessage(mountListeners.at(i), message);
     }
 }
 

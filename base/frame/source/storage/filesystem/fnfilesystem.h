@@ -153,9 +153,11 @@ class FNFileSystem : public FFileSystem
     /// Tells the watcher of a change; `kind` is one of FileSystemChange, `newPath` may be null. Does nothing
     /// without a messenger or a running watcher, and for excluded paths. Thread-safe.
     void onFileSystemChange(int kind, const FNPath* path, const FNPath* newPath);
-    /// `listener` gets the messages "VolMount" and "VolUnmount", with the root as "kRootPath". Not counted.
+    /// `listener` gets the messages "VolMount" and "VolUnmount", with the root as "kRootPath", at the next
+    /// pulse. Not counted.
     void subscribeToMountEvent(CmObject* listener);
     void unsubscribeFromMountEvent(CmObject* listener);
+    /// One of these names; others are ignored.
     void onMountEvent(const char* eventName, FNPath* root);
 
     // The folder that file dialogs begin with

@@ -51,6 +51,7 @@ bool FNPath::restoreAttributes(FAttributes& attributes)
         path.assign(u"");
     if (!attributes.get("Type", type))
         type = kFile;
+    fileType.reset();
     if (!isFolder())
         attributes.getMember("FileType", fileType);
     int32 layout = kWindowsLayout;

@@ -310,10 +310,10 @@ bool FPath::operator==(const FPath& other) const
 
 bool FPath::internalize(FArchive&)
 {
-    return false;
+    return true;
 }
 
 bool FPath::externalize(FArchive&) const
 {
-    return false;
+    return true;
 }

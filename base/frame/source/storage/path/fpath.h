@@ -120,7 +120,7 @@ class FPath : public CmObject, public IPath
     bool isEqual(const CmObject* other) const override;
     bool operator==(const FPath& other) const;
 
-    // Storage: nothing is stored by the base class
+    // Storage: the base class has nothing to store, and says that all went well
     bool internalize(FArchive& archive) override;
     bool externalize(FArchive& archive) const override;
 

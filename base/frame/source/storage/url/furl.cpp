@@ -164,6 +164,8 @@ void FUrl::set(const char* newProtocol, const char* newHost, uint16 newPort, con
     host.assign(newHost);
     port = static_cast<int16>(newPort);
     file.assign(newFile ? newFile : u"");
+    user.assign(u"");
+    password.assign(u"");
     updatePath();
 }
 
