@@ -382,7 +382,8 @@ void XmlArchiveWriter::append(std::string_view text)
         isWhole = isWhole && stream.writeRaw(text.data(), size) == size;
         return;
     }
-    memcpy(buffer->ptr() + filled, text.data(), text.size());
+    if (!text.empty())
+        memcpy(buffer->ptr() + filled, text.data(), text.size());
     filled += static_cast<uint32>(text.size());
 }
 
