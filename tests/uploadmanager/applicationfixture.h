@@ -1,5 +1,6 @@
 #pragma once
 
+#include "application/urlprotocols.h"
 #include "containers/sequence/cmarray.h"
 #include "foundation/text/cmstring.h"
 #include "uploadmanager/puploadmanagerapplication.h"
@@ -63,6 +64,7 @@ protected:
         setenv("XDG_CONFIG_HOME", home.c_str(), 1);
         setenv("XDG_DATA_HOME", home.c_str(), 1);
         setenv("VELLAMOOR_UI", "console", 1);
+        registerUrlProtocols();
         restart();
     }
     void TearDown() override

@@ -122,3 +122,12 @@ TEST(CmDate, ComparesAndHashesByItsNumber)
     EXPECT_TRUE(early.isEqual(&static_cast<const CmObject&>(CmDate(5u))));
     EXPECT_EQ(late.hash(4), 3u);
 }
+
+TEST(CmDate, IsBuiltUpFromAnUnsetOnePartByPart)
+{
+    CmDate date(0u);
+    date.setYear(2012);
+    date.setMonth(2);
+    date.setDay(29);
+    EXPECT_EQ(date, CmDate(29u, 2u, 2012u));
+}

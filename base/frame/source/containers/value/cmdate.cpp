@@ -280,13 +280,22 @@ int32 CmDate::year(int* result)
     return answerNumber(result, year());
 }
 
+// A date that was never set is built up part by part from a first of January.
+void CmDate::beginWhereInvalid()
+{
+    if (!isValid())
+        julian = julDay(1, 1, 1);
+}
+
 int32 CmDate::setDay(int day)
 {
+    beginWhereInvalid();
     return setChecked(static_cast<unsigned>(day), month(), year());
 }
 
 int32 CmDate::setMonth(int month)
 {
+    beginWhereInvalid();
     const auto newMonth = static_cast<unsigned>(month);
     return setChecked(std::min(dayOfMonth(), getDaysInMonth(newMonth, year())), newMonth, year());
 }
@@ -295,6 +304,7 @@ int32 CmDate::setYear(int year)
 {
     if (year < 0)
         return kResultInvalidArgument;
+    beginWhereInvalid();
     const auto newYear = static_cast<unsigned>(year);
     return setChecked(std::min(dayOfMonth(), getDaysInMonth(month(), newYear)), month(), newYear);
 }

@@ -97,6 +97,7 @@ class CmDate : public CmObject, public IDateModifier
     bool restoreAttributes(FAttributes& attributes) override;
 
 private:
+    void beginWhereInvalid();
     int32 setChecked(unsigned day, unsigned month, unsigned year);
 
     unsigned julian;
