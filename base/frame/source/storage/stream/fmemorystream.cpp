@@ -23,6 +23,29 @@ int64 wholePages(int64 bytes)
     constexpr int64 kMax = std::numeric_limits<int64>::max();
     return bytes > kMax - kPage ? kMax : ((bytes - 1) & -kPage) + kPage;
 }
+
+/// Most transfers are single numbers: of a known size they are one move each, without a call.
+void transfer(void* target, const void* source, int64 count)
+{
+    switch (count)
+    {
+    case 1:
+        memcpy(target, source, 1);
+        break;
+    case 2:
+        memcpy(target, source, 2);
+        break;
+    case 4:
+        memcpy(target, source, 4);
+        break;
+    case 8:
+        memcpy(target, source, 8);
+        break;
+    default:
+        memcpy(target, source, static_cast<size_t>(count));
+        break;
+    }
+}
 } // namespace
 
 FMemoryStream::FMemoryStream(void* memory, int64 length)
@@ -138,7 +161,7 @@ int64 FMemoryStream::writeRaw(const void* source, int64 count)
         return 0;
     if (!data || cursor < 0 || !source || count < 1 || end < cursor)
         return 0;
-    memcpy(data + cursor, source, static_cast<size_t>(count));
+    transfer(data + cursor, source, count);
     cursor = end;
     return count;
 }
@@ -153,7 +176,7 @@ int64 FMemoryStream::readRaw(void* target, int64 count)
         return 0;
     }
     const int64 taken = std::min(count, size - cursor);
-    memcpy(target, data + cursor, static_cast<size_t>(taken));
+    transfer(target, data + cursor, taken);
     cursor += taken;
     return taken;
 }
