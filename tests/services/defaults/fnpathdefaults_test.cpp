@@ -58,7 +58,7 @@ TEST_F(FNPathDefaults, LastPathSurvives)
 
 TEST_F(FNPathDefaults, DialogsBeginWhereTheLastOneOfTheirTypeEnded)
 {
-    const auto initPath = [this](CmContainer* wanted)
+    const auto initPath = [](CmContainer* wanted)
     {
         FNPath* folder = nullptr;
         FString name(u"a/b");
