@@ -248,6 +248,10 @@ TEST(FXmlArchive, LongChainsOfObjectsAreSavedReadAndReleased)
     FAttributes tree;
     ASSERT_TRUE(load(text, tree));
     EXPECT_EQ(tree.getObjectAttributes("a")->getInt("Number"), length - 1);
+    int made = 0;
+    for (auto* node = FCast(StoredNode, tree.getObject("a", "StoredNode")); node; node = node->nextNode())
+        made++;
+    EXPECT_EQ(made, FArchive::kMaxDepth) << "deeper ones are not made, rather than exhaust the stack";
 }
 
 TEST(FXmlArchive, ReferencesToNothingAreNoError)

@@ -147,6 +147,8 @@ void FXmlArchiveParser::close()
 {
     if (open.back().tree)
         nesting--;
+    if (open.back().block)
+        open.back().block->rewind();
     if (open.back().place == Place::kRootTag)
         isRootClosed = true;
     pendingDigit = -1;

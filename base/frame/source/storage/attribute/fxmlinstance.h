@@ -24,7 +24,8 @@ class FXmlInstance : public FXmlObject
 
     FXmlInstance* getInstance() override { return this; }
     /// Makes the object from class and tree when first called, and releases the tree. What can't be made is null,
-    /// and is not tried again. Objects that refer to one another in a circle meet the one that is being made.
+    /// and is not tried again. Objects that refer to one another in a circle meet the one that is being made. Null,
+    /// and the tree stays, where more than FArchive::kMaxDepth objects are being made one inside the other.
     CmObject* makeObject(const char* wantedClass);
     /// Null until the object was made. Borrowed.
     CmObject* getMadeObject() const { return object; }

@@ -76,16 +76,10 @@ void FXmlLinker::Walk::follow(Link& link)
     way.push_back(&node);
 }
 
-FXmlLinker::FXmlLinker() : instances(50)
-{
-    instances.setHashFunction(gHashObject);
-    instances.setAutoResize(true);
-    instances.retainElements();
-}
-
 void FXmlLinker::addInstance(FXmlInstance* instance)
 {
-    instances.add(instance);
+    instances.push_back(instance);
+    byID.emplace(instance->getID(), instance);
 }
 
 void FXmlLinker::addReference(FXmlReference* reference, FXmlInstance* holder)
@@ -95,8 +89,8 @@ void FXmlLinker::addReference(FXmlReference* reference, FXmlInstance* holder)
 
 FXmlInstance* FXmlLinker::lookup(uint64 id) const
 {
-    const FXmlReference wanted(id);
-    return FCast(FXmlInstance, instances.lookup(&wanted));
+    const auto found = byID.find(id);
+    return found == byID.end() ? nullptr : found->second;
 }
 
 void FXmlLinker::link()

@@ -1,18 +1,16 @@
 #pragma once
 
-#include "containers/keyed/cmhashtable.h"
 #include "foundation/object/iptr.h"
 #include "storage/attribute/fxmlinstance.h"
 #include "storage/attribute/fxmlreference.h"
 
+#include <map>
 #include <vector>
 
 /// Joins references to the objects that they name, once all of a file has been read. One thread at a time.
 class FXmlLinker
 {
 public:
-    FXmlLinker();
-
     /// Adds a reference. Of two objects with one number the first is found.
     void addInstance(FXmlInstance* instance);
     /// `holder` is the object in whose tree the reference stands; null where it stands in none. Both are held until
@@ -33,7 +31,9 @@ private:
     };
     class Walk;
 
-    CmHashTable instances;
+    std::vector<IPtr<FXmlInstance>> instances;
+    /// A tree, since the numbers come from a file, which could choose them to fall into one bucket.
+    std::map<uint64, FXmlInstance*> byID;
     std::vector<Link> links;
     std::vector<FXmlInstance*> roots;
 };
