@@ -91,10 +91,10 @@ int32 XmlWriter2::writeEndTag(const char* name, bool endSingleLine)
     Xml::appendText(line, name);
     line.put('>');
     const int32 result = writeLine(singleLine ? 0 : depth);
-    if (!singleLine || !endSingleLine || result != kResultOk)
+    if (!singleLine || !endSingleLine)
         return result;
     singleLine = false;
-    return newLine();
+    return result == kResultOk ? newLine() : result;
 }
 
 int32 XmlWriter2::writeString8(const char* text)
