@@ -30,26 +30,26 @@ bool GlibHandOver::start(const char16_t* name, int argc, char** argv)
     id = busName(name);
     for (int attempt = 0; attempt < kAttempts; attempt++)
     {
-        if (becomeFirst())
-            return true;
-        if (handOver(argc, argv))
-            return false;
+        if (meetOthers())
+        {
+            if (!g_application_get_is_remote(application))
+                return true;
+            if (handOver(argc, argv))
+                return false;
+        }
         g_usleep(kPauseMicroseconds);
     }
     // Nobody takes the arguments, so nobody but this process can work on them.
     return true;
 }
 
-bool GlibHandOver::becomeFirst()
+bool GlibHandOver::meetOthers()
 {
     stop();
     application = g_application_new(id.c_str(), G_APPLICATION_HANDLES_COMMAND_LINE);
     g_signal_connect(application, "command-line", G_CALLBACK(&GlibHandOver::onCommandLine), this);
     g_signal_connect(application, "activate", G_CALLBACK(&ignoreActivation), nullptr);
-    // A bus that refuses the name for another reason is as good as none.
     if (!g_application_register(application, nullptr, nullptr))
-        return true;
-    if (g_application_get_is_remote(application))
         return false;
     // A session that ends is no reason to end in the midst of an upload.
     if (GDBusConnection* bus = g_application_get_dbus_connection(application))

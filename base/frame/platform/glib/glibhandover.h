@@ -36,7 +36,8 @@ public:
     void stop();
 
 private:
-    bool becomeFirst();
+    /// Whether it is clear who is the first; the process that has the name may be ending.
+    bool meetOthers();
     bool handOver(int argc, char** argv);
     static int onCommandLine(GApplication*, GApplicationCommandLine* line, gpointer self);
 
