@@ -94,6 +94,15 @@ TEST(CmDate, IsADateToComponentsByIdentifier)
     EXPECT_EQ(day, 29) << "a refused change leaves the date";
 }
 
+TEST(CmDate, IsPutTogetherFromAnUnsetOneYearFirst)
+{
+    CmDate date(0u);
+    EXPECT_NE(date.setMonth(3), 0) << "a month of no year";
+    EXPECT_FALSE(date.isValid());
+    EXPECT_EQ(date.setYear(2012) | date.setMonth(3) | date.setDay(14), 0);
+    EXPECT_TRUE(date == CmDate(14, 3, 2012));
+}
+
 TEST(CmDate, ReadsWhatItPrints)
 {
     const CmDate date(23u, 5u, 2012u);

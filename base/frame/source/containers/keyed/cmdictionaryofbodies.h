@@ -22,13 +22,10 @@ bool CmDictionaryOf<Container>::add(CmObject* key, CmObject* object)
 template <class Container>
 bool CmDictionaryOf<Container>::add(CmObject* object)
 {
-    CmAssociation* association = FCast(CmAssociation, object);
-    if (!association || !association->getKey() || lookupAssoc(association->getKey()) ||
-        !Container::add(object))
+    const CmAssociation* association = FCast(CmAssociation, object);
+    if (!association || !association->getKey() || lookupAssoc(association->getKey()))
         return false;
-    if (this->_ownsObjects != CmContainer::kShared)
-        association->handOver();
-    return true;
+    return Container::add(object);
 }
 
 template <class Container>
@@ -136,20 +133,6 @@ bool CmDictionaryOf<Container>::addFromOther(CmObject* element)
             member->release();
     }
     return isAdded;
-}
-
-template <class Container>
-bool CmDictionaryOf<Container>::addRestored(CmObject* element)
-{
-    // An attribute tree may give the same association to several dictionaries, so each makes its own.
-    const IPtr<CmObject> restored = adopt(element);
-    const CmAssociation* association = FCast(CmAssociation, element);
-    if (!association || !add(association->getKey(), association->getObject()))
-        return false;
-    association->getKey()->addRef();
-    if (association->getObject())
-        association->getObject()->addRef();
-    return true;
 }
 
 // What an association that has left held; in mode 0 the association itself is still to be released.

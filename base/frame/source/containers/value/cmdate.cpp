@@ -306,6 +306,8 @@ int32 CmDate::setYear(int year)
         return kResultInvalidArgument;
     beginWhereInvalid();
     const auto newYear = static_cast<unsigned>(year);
+    if (!isValid())
+        return setChecked(1, 1, newYear); // what is put together from an unset date begins at New Year
     return setChecked(std::min(dayOfMonth(), getDaysInMonth(month(), newYear)), month(), newYear);
 }
 
