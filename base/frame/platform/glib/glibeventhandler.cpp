@@ -8,6 +8,7 @@
 #include <glib-unix.h>
 
 #include <csignal>
+#include <cstring>
 #include <utility>
 
 namespace
@@ -37,6 +38,16 @@ std::string pathOf(const std::string& argument, const std::string& folder)
         return argument;
     const size_t start = argument.compare(0, 2, "./") == 0 ? 2 : 0;
     return folder + (folder.back() == '/' ? "" : "/") + argument.substr(start);
+}
+
+/// Blanks what follows the path of a URL: it may be secret, and everybody can read it in the list of processes.
+void hideQuery(char* argument)
+{
+    const char* end = strpbrk(argument, ":/?#");
+    if (!end || *end != ':')
+        return; // a path
+    if (char* query = strpbrk(argument, "?#"))
+        memset(query, 0, strlen(query));
 }
 
 /// A file is refused while the user has something to answer.
@@ -82,9 +93,15 @@ bool GlibEventHandler::open(int appType)
     }
     if (!Argv || !gApplication)
         return true;
-    if (!handOver.start(gApplication->getName(), Argc, Argv))
+    const std::vector<std::string> arguments(Argv, Argv + Argc);
+    std::vector<char*> pointers;
+    for (const std::string& argument : arguments)
+        pointers.push_back(const_cast<char*>(argument.c_str()));
+    for (int i = 1; i < Argc; i++)
+        hideQuery(Argv[i]);
+    if (!handOver.start(gApplication->getName(), Argc, pointers.data()))
         return false;
-    collectArguments();
+    collectArguments(arguments);
     watchTermination();
     return true;
 }
@@ -100,11 +117,11 @@ void GlibEventHandler::close(bool)
     startList.clear();
 }
 
-void GlibEventHandler::collectArguments()
+void GlibEventHandler::collectArguments(const std::vector<std::string>& arguments)
 {
     const std::string folder = currentFolder();
-    for (int i = 1; i < Argc; i++)
-        startList.push_back({Argv[i], folder});
+    for (size_t i = 1; i < arguments.size(); i++)
+        startList.push_back({arguments[i], folder});
 }
 
 void GlibEventHandler::watchTermination()

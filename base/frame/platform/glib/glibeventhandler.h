@@ -61,7 +61,7 @@ private:
     void onTimer() override;
     bool takesArguments() override;
     void receiveArgument(const std::string& argument, const std::string& folder) override;
-    void collectArguments();
+    void collectArguments(const std::vector<std::string>& arguments);
     void deliverStartList();
     static gboolean onLaunched(gpointer self);
     static gboolean onTermination(gpointer self);
