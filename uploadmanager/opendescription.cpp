@@ -11,6 +11,7 @@
 #include "uploadmanager/descriptionform.h"
 #include "uploadmanager/puploadmanagerapplication.h"
 #include "uploadmanager/storednames.h"
+#include "uploadmanager/storedpath.h"
 #include "uploadmanager/uploadrequest.h"
 #include "uploadmanager/uploadtexts.h"
 #include "uploadmanager/uploadthread.h"
@@ -111,12 +112,11 @@ void PUploadManagerApplication::takeDescription(FPath* path)
 void PUploadManagerApplication::forgetCachedDescription()
 {
     FAttributes cache;
-    FString text;
-    if (FXmlArchive::loadAttributes(kCacheFile, kCacheRoot, cache) && cache.get(kCacheKey, text))
+    if (FXmlArchive::loadAttributes(kCacheFile, kCacheRoot, cache))
     {
-        FNPath waiting(text.text16(), FPath::kFile);
-        if (!waiting.isEqual(requestFile))
-            removeIfThere(&waiting);
+        IPtr<FNPath> waiting = restorePath(cache, kCacheKey);
+        if (!waiting->isEqual(requestFile))
+            removeIfThere(waiting);
     }
     FXmlArchive::removeObjectArchive(kCacheFile);
 }
@@ -153,7 +153,7 @@ void PUploadManagerApplication::waitForLogin(FPath* path)
 {
     FString text = getPathText(path);
     FAttributes cache;
-    cache.set(kCacheKey, text, true);
+    storePath(cache, kCacheKey, text);
     if (text.isEmpty() || !FXmlArchive::saveAttributes(kCacheFile, kCacheRoot, cache))
     {
         fatalError(kFatalCache);

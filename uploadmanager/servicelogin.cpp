@@ -14,6 +14,7 @@
 #include "uploadmanager/serviceconfiguration.h"
 #include "uploadmanager/sharedbrowser.h"
 #include "uploadmanager/storednames.h"
+#include "uploadmanager/storedpath.h"
 #include "uploadmanager/transfer.h"
 #include "uploadmanager/uploadtexts.h"
 #include "uploadmanager/vlmrapplication.h"
@@ -240,8 +241,6 @@ bool PUploadManagerApplication::openWaitingDescription()
         quitAtIdle = true;
         return true;
     }
-    FString text;
-    cache.get(kCacheKey, text);
-    IPtr<FNPath> path = adopt(new FNPath(text.text16(), FPath::kFile));
+    IPtr<FNPath> path = restorePath(cache, kCacheKey);
     return openFile(path, nullptr);
 }

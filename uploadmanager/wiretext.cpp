@@ -1,5 +1,6 @@
 #include "uploadmanager/wiretext.h"
 
+#include "storage/filesystem/diskname.h"
 #include "storage/path/fnpath.h"
 
 FString toWireText(const ConstString& text)
@@ -11,7 +12,7 @@ FString toWireText(const ConstString& text)
 
 FString toWirePath(const FNPath& path)
 {
-    return FString(path.platformPath().c_str());
+    return FString(DiskName::find(path).c_str());
 }
 
 FString getPathText(const FPath* path)
