@@ -54,6 +54,24 @@ protected:
 
 class BadUserFile : public Job
 {
+protected:
+    /// A start with a track, while the login page is closed.
+    std::string runWithoutLogin()
+    {
+        useService({});
+        service->plan("/connect status 500 closed");
+        return run({writeDescription(minimal())});
+    }
+
+    bool wasUploaded() const
+    {
+        const std::vector<ReceivedRequest> tracks = received("/tracks");
+        return std::any_of(tracks.begin(), tracks.end(),
+                           [](const ReceivedRequest& track) { return track.status == 201; });
+    }
+
+    /// Only a run that ends without a message and without an upload was sent there.
+    bool wasSentToLogin() const { return !wasUploaded() && service->waitForRequests("/connect", 1, kHangs); }
 };
 
 class FileName : public Job
@@ -116,14 +134,17 @@ TEST_F(BadDescription, OfAHundredThousandLevelsIsRefused)
     EXPECT_EQ(runWith(inside).substr(0, 23), "Internal program error.");
 }
 
-TEST_F(BadDescription, OfAHundredMegabytesEndsWithAnAnswer)
+TEST_F(BadDescription, OfAHundredMegabytesIsReadInBoundedMemory)
 {
     std::string large = minimal().text();
     large.insert(large.find("<Track>"), "<Filler>" + std::string(100 << 20, 'x') + "</Filler>");
+    service->plan("/tracks stall 0");
     Run run = start({writeFile("description.xml", large)});
-    const std::string printed = run.finish();
-    EXPECT_TRUE(received("/tracks").size() == 1 || holds(printed, "Internal program error.")) << printed;
+    ASSERT_TRUE(waitUntil([&] { return service->stalled() == 1 || !run.process->isRunning(); }));
     EXPECT_LT(run.process->peakMemory(), 1 << 20) << "KiB";
+    service->release();
+    const std::string printed = run.finish();
+    EXPECT_TRUE(received("/tracks").size() == 1 || printed == errorCode(7)) << printed;
 }
 
 TEST_F(BadDescription, InTheMiddleOfAnUploadEndsTheRun)
@@ -138,12 +159,12 @@ TEST_F(BadDescription, InTheMiddleOfAnUploadEndsTheRun)
 TEST_F(BadRedirect, EndsWithItsNumberAndSavesNothing)
 {
     EXPECT_EQ(redirect(""), errorCode(9));
-    EXPECT_EQ(redirect("?"), errorCode(9));
+    EXPECT_EQ(redirect("?"), errorCode(22));
     EXPECT_EQ(redirect("?code=1"), errorCode(9));
     EXPECT_EQ(redirect("?code"), errorCode(22));
     EXPECT_EQ(redirect("?a=b=c&d=e"), errorCode(22));
     EXPECT_EQ(redirect("?=#=&&##=%"), errorCode(22));
-    EXPECT_EQ(redirect("?state=%&scope=%4"), errorCode(9));
+    EXPECT_EQ(redirect("?state=%&scope=%4"), errorCode(22));
     EXPECT_EQ(run({"vlmr:"}), errorCode(9));
     EXPECT_EQ(run({"vlmr://nobody/successfullLogin?access_token=1"}), errorCode(9));
     EXPECT_FALSE(exists(userFile("scat")));
@@ -155,9 +176,12 @@ TEST_F(BadRedirect, OfGreatLengthIsTakenAsItIs)
     const std::string value(120000, 'v'); // near the most that the system hands over as one argument
     EXPECT_EQ(redirect("?error=" + value), "SoundCloud answered:\n" + value + "\n");
 
-    const std::string longToken(100000, 't');
-    EXPECT_EQ(redirect("?access_token=" + longToken), "");
-    EXPECT_HOLDS(contentsOf(userFile("scat")), base64(longToken));
+    const std::string kept(1000, 't'), tooLong(100000, 't');
+    EXPECT_EQ(redirect("?access_token=" + kept), "");
+    EXPECT_EQ(contentsOf(userFile("scat")), attributeFile("scat", {{"Loomrit", base64(kept)}}));
+    EXPECT_EQ(redirect("?access_token=" + tooLong), "");
+    EXPECT_EQ(contentsOf(userFile("scat")), attributeFile("scat", {{"Loomrit", base64(kept)}}))
+        << "longer than a value may be: the old file stays";
 }
 
 TEST_F(BadRedirect, WithATokenOfOtherBytesIsNoCrash)
@@ -170,20 +194,9 @@ TEST_F(BadRedirect, WithATokenOfOtherBytesIsNoCrash)
     }
 }
 
-TEST_F(BadRedirect, WithALineFeedInTheTokenSendsNoHeaderOfItsOwn)
-{
-    logIn("Loomrit", "a\r\nX-Own: b");
-    service->plan("/connect status 500 closed");
-    run({writeDescription(minimal())});
-    EXPECT_TRUE(received("/tracks").empty());
-    for (const ReceivedRequest& request : received("/me"))
-        EXPECT_LACKS(request.target, "X-Own: b");
-}
-
-TEST_F(BadUserFile, DamagedAtAnyPlaceCountsAsAbsent)
+TEST_F(BadUserFile, DamagedAtAnyPlaceGivesNoTokenButATrueOne)
 {
     const std::string good = attributeFile("scat", {{"Loomrit", base64(token())}});
-    int uploads = 0, logins = 0;
     for (std::size_t at = 0; at < good.size(); at += 9)
     {
         for (const bool cut : {true, false})
@@ -192,20 +205,16 @@ TEST_F(BadUserFile, DamagedAtAnyPlaceCountsAsAbsent)
             if (!cut)
                 bad[at] = static_cast<char>(bad[at] ^ 0x04);
             writeUserFile("scat", bad);
-            service->plan("/connect status 500 closed");
-            const std::size_t before = received("/tracks").size(), opened = openedUrls().size();
-            const std::string printed = run({writeDescription(minimal())});
-            EXPECT_LACKS(printed, "Internal program error.") << at << cut;
-
-            const bool uploaded = received("/tracks").size() == before + 1;
-            uploaded ? ++uploads : ++logins;
-            EXPECT_TRUE(waitUntil([&] { return openedUrls().size() == opened + 1; })) << at << cut;
+            const std::string printed = runWithoutLogin();
+            // Where the damage makes another token: the service refuses it, or it cannot stand in a URL.
+            EXPECT_TRUE(printed == errorCode(1003) || wasUploaded() || wasSentToLogin())
+                << at << cut << printed;
+            EXPECT_FALSE(cut && wasUploaded()) << at;
         }
     }
-    EXPECT_GT(logins, uploads) << "a file that is cut short gives no token";
 }
 
-TEST_F(BadUserFile, WithForeignValuesMeansANewLogin)
+TEST_F(BadUserFile, WithForeignValuesUploadsNothing)
 {
     const std::vector<std::string> files = {
         "<scat><int name=\"Loomrit\" value=\"5\"/></scat>",
@@ -213,16 +222,16 @@ TEST_F(BadUserFile, WithForeignValuesMeansANewLogin)
         "<scat><string name=\"Loomrit\" value=\"%%% no base64 %%%\"/></scat>",
         "<scat><string name=\"Loomrit\" value=\"\xC3\xA4\" wide=\"true\"/></scat>",
         "<scat><string name=\"Loomrit\" value=\"" + std::string(1 << 20, 'Q') + "\"/></scat>",
-        "<other><string name=\"Loomrit\" value=\"Zm9v\"/></other>",
+        "<scat><string name=\"Loomrit\" value=\"" + base64("a\r\nX-Own: b") + "\"/></scat>",
+        "<other><string name=\"Loomrit\" value=\"" + base64(token()) + "\"/></other>",
     };
     for (const std::string& file : files)
     {
         writeUserFile("scat", "<?xml version=\"1.0\" encoding=\"utf-8\"?>\r" + file + "\r");
-        service->plan("/connect status 500 closed");
-        run({writeDescription(minimal())});
+        const std::string printed = runWithoutLogin();
+        EXPECT_FALSE(wasUploaded()) << file.substr(0, 100);
+        EXPECT_TRUE(printed == errorCode(1003) || wasSentToLogin()) << file.substr(0, 100) << printed;
     }
-    EXPECT_TRUE(received("/tracks").empty());
-    EXPECT_TRUE(waitUntil([&] { return openedUrls().size() >= 4; }));
 }
 
 TEST_F(BadUserFile, OfTheCacheCountsAsNoWaitingDescription)
@@ -308,9 +317,9 @@ TEST_F(FileName, OfATrackIsSentAsItStands)
         description.track({{"Path", writeFile(name, "sound")}});
     const std::string quoted = writeFile("say \"yes\".wav", "sound");
     description.track({{"Path", quoted}});
-    run({writeDescription(description)});
+    const std::string printed = run({writeDescription(description)});
 
-    ASSERT_EQ(received("/tracks").size(), names.size() + 1);
+    ASSERT_EQ(received("/tracks").size(), names.size() + 1) << printed;
     for (std::size_t i = 0; i < names.size(); ++i)
         EXPECT_EQ(received("/tracks")[i].fields.at(0).fileName, names[i]);
     EXPECT_EQ(received("/tracks").back().field("track[title]")->text, "say \"yes\"");

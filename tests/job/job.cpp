@@ -140,17 +140,24 @@ void Job::expectNoToken(const Path& file) const
 /// A bus that lives as long as this process holds the other end of its standard input.
 void Job::startBus()
 {
-    const Path input = root / "runtime" / "bus-input";
+    const Path input = root / "runtime" / "bus-input", addressFile = root / "runtime" / "bus-address";
     ASSERT_EQ(mkfifo(input.c_str(), 0600), 0);
     busInput = open(input.c_str(), O_RDWR | O_CLOEXEC);
-    const std::string script = "printf '%s\\n' \"$DBUS_SESSION_BUS_ADDRESS\"; exec cat <" + input.string();
+    const std::string script = "printf '%s\\n' \"$DBUS_SESSION_BUS_ADDRESS\" >" + addressFile.string() +
+                               "; exec cat <" + input.string();
     Process::Setup setup;
     setup.arguments = {"dbus-run-session", "--", "sh", "-c", script};
     setup.environment = environment();
-    setup.output = root / "runtime" / "bus-address";
+    setup.output = root / "runtime" / "bus-output"; // the bus complains here of limits that it may not raise
     bus = std::make_unique<Process>(setup);
-    ASSERT_TRUE(bus->waitForOutput("\n"));
-    std::string address = bus->output();
+    std::string address;
+    ASSERT_TRUE(waitUntil(
+        [&]
+        {
+            address = contentsOf(addressFile);
+            return address.ends_with('\n') || !bus->isRunning();
+        }));
+    ASSERT_TRUE(address.ends_with('\n')) << bus->output();
     address.pop_back();
     setVariable("DBUS_SESSION_BUS_ADDRESS", address);
 }

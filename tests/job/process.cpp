@@ -1,13 +1,13 @@
 #include "tests/job/process.h"
 
 #include <csignal>
+#include <cstdlib>
 #include <fstream>
 #include <iterator>
 #include <thread>
 
 #include <fcntl.h>
 #include <spawn.h>
-#include <sys/resource.h>
 #include <sys/wait.h>
 
 namespace
@@ -75,18 +75,21 @@ std::optional<int> Process::wait(std::chrono::milliseconds time)
     while (!result)
     {
         int status = 0;
-        rusage usage{};
-        if (wait4(child, &status, WNOHANG, &usage) == child)
-        {
+        if (waitpid(child, &status, WNOHANG) == child)
             result = WIFEXITED(status) ? WEXITSTATUS(status) : 128 + WTERMSIG(status);
-            peak = usage.ru_maxrss;
-        }
         else if (std::chrono::steady_clock::now() >= end)
             break;
         else
             pauseBriefly();
     }
     return result;
+}
+
+long Process::peakMemory() const
+{
+    const std::string status = contentsOf("/proc/" + std::to_string(child) + "/status");
+    const std::size_t at = status.find("VmHWM:");
+    return at == std::string::npos ? 0 : std::atol(status.c_str() + at + 6);
 }
 
 std::string Process::output() const

@@ -43,14 +43,13 @@ public:
     bool waitForOutput(const std::string& text);
 
     pid_t id() const { return child; }
-    /// The greatest memory it ever had, in KiB; known once it has ended.
-    long peakMemory() const { return peak; }
+    /// The most memory that it has had so far, in KiB; only while it runs.
+    long peakMemory() const;
 
 private:
     pid_t child = -1;
     std::string outputFile;
     std::optional<int> result;
-    long peak = 0;
 };
 
 /// The bytes of a file; empty if it cannot be read.

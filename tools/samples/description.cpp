@@ -122,7 +122,7 @@ SampleDescription::Elements everyElement(const std::string& audio, const std::st
             {"MediaTrackTitle", "Evening Walk (夕方の散歩)"},
             {"AudioISRC", "DEXX12000001"},
             {"LabelCode", "LC 01234"},
-            {"MediaComment", "Recorded <live> & in one take."},
+            {"MediaComment", "Recorded live & in one take."},
             {"UrlArtwork", cover},
             {"MusicalTempo", "120"},
             {"MusicalRootKey", "A"},

@@ -58,9 +58,9 @@ CertificateHolder makeBare(EVP_PKEY* key, const char* name, long firstSecond, lo
 
 } // namespace
 
-CertificateAuthority::CertificateAuthority() : key(makeKey())
+CertificateAuthority::CertificateAuthority(const char* name) : key(makeKey())
 {
-    certificate = makeBare(key.get(), "Stand-in authority", -kDay, 2 * kDay);
+    certificate = makeBare(key.get(), name, -kDay, 2 * kDay);
     X509* own = certificate.get();
     X509_set_issuer_name(own, X509_get_subject_name(own));
     addExtension(own, own, NID_basic_constraints, "critical,CA:TRUE");

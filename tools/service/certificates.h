@@ -29,7 +29,7 @@ struct ServerIdentity
 class CertificateAuthority
 {
 public:
-    CertificateAuthority();
+    explicit CertificateAuthority(const char* name = "Stand-in authority");
 
     /// The authority's certificate in PEM form.
     std::string pem() const;

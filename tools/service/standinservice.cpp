@@ -415,7 +415,7 @@ StandInService::StandInService(const CertificateAuthority& authority, Options op
         listener = std::make_unique<Listener>(*state, authority.issueExpired());
         break;
     case Identity::otherAuthority:
-        listener = std::make_unique<Listener>(*state, CertificateAuthority().issue());
+        listener = std::make_unique<Listener>(*state, CertificateAuthority("Authority of nobody").issue());
         break;
     }
 }

@@ -33,8 +33,10 @@ void CmDelegatingUnknown::setModule(FModule* owner)
 
 int32 CmDelegatingUnknown::queryInterface(const char* interfaceID, void** object)
 {
-    return delegate ? delegate->queryInterface(interfaceID, object)
-                    : CmObject::queryInterface(interfaceID, object);
+    if (delegate)
+        return delegate->queryInterface(interfaceID, object);
+    *object = nullptr;
+    return kNoInterface;
 }
 
 bool CmDelegatingUnknown::isEqual(const CmObject* other) const

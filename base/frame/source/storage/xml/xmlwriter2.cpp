@@ -91,10 +91,10 @@ int32 XmlWriter2::writeEndTag(const char* name, bool endSingleLine)
     Xml::appendText(line, name);
     line.put('>');
     const int32 result = writeLine(singleLine ? 0 : depth);
-    if (!singleLine || !endSingleLine)
+    if (!singleLine || !endSingleLine || result != kResultOk)
         return result;
     singleLine = false;
-    return result == kResultOk ? newLine() : result;
+    return newLine();
 }
 
 int32 XmlWriter2::writeString8(const char* text)
