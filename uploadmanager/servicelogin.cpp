@@ -61,6 +61,11 @@ CmString* lookupText(CmDictionary& dictionary, const char16* key)
     return FCast(CmString, dictionary.lookupObject(&name));
 }
 
+bool isUsableToken(FString& token)
+{
+    return ClearToken(token).isUsable();
+}
+
 bool contains(const ConstString& text, const ConstString& word)
 {
     return text.findNext(0, word) >= 0;
@@ -69,7 +74,7 @@ bool contains(const ConstString& text, const ConstString& word)
 
 bool PUploadManagerApplication::isValidAccessToken(FString& token)
 {
-    if (token.isEmpty() || !checkInitializeCurl(kFatalCurlGlobal))
+    if (token.isEmpty() || !isUsableToken(token) || !checkInitializeCurl(kFatalCurlGlobal))
         return false;
     CURL* curl = curl_easy_init();
     if (!curl)
