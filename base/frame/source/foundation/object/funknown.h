@@ -8,15 +8,21 @@
 
 /// Defines the constant `<Interface>_iid` and, from it, `<Interface>::iid`. Both are constants of the program
 /// image, so an identifier can be used by any static initialiser.
-#define DEFINE_INTERFACE_ID(Interface, word1, word2, word3, word4)                                                \
-    extern constexpr FUIDBytes Interface##_iid = fuidBytes(word1, word2, word3, word4);                           \
+#define DEFINE_INTERFACE_ID(Interface, word1, word2, word3, word4)                                           \
+    extern constexpr FUIDBytes Interface##_iid = fuidBytes(word1, word2, word3, word4);                      \
     constinit const FUID Interface::iid(Interface##_iid);
 
 /// Lets a class that is reached through several interfaces count its references in one place, its `Base`.
-#define FORWARD_FUNKNOWN(Base)                                                                                    \
-public:                                                                                                           \
-    uint32 addRef() override { return Base::addRef(); }                                                           \
-    uint32 release() override { return Base::release(); }
+#define FORWARD_FUNKNOWN(Base)                                                                               \
+public:                                                                                                      \
+    uint32 addRef() override                                                                                 \
+    {                                                                                                        \
+        return Base::addRef();                                                                               \
+    }                                                                                                        \
+    uint32 release() override                                                                                \
+    {                                                                                                        \
+        return Base::release();                                                                              \
+    }
 
 /// Root of all interfaces: identity by identifier, and a count of references.
 ///

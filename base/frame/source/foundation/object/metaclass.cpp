@@ -5,14 +5,21 @@
 #include <cstring>
 
 MetaClass::MetaClass(const char* name, CreateFunction create, const char* uid, MetaClass* base, int16 version)
-    : className(name), persistentName(name), classID(uid), createFunction(create), baseClass(base),
+    : className(name),
+      persistentName(name),
+      classID(uid),
+      createFunction(create),
+      baseClass(base),
       classVersion(version)
 {
     enter();
 }
 
 MetaClass::MetaClass(MetaClass* target, const char* alias)
-    : className(alias), persistentName(alias), createFunction(target->createFunction), baseClass(nullptr),
+    : className(alias),
+      persistentName(alias),
+      createFunction(target->createFunction),
+      baseClass(nullptr),
       classVersion(0)
 {
     target->persistentName = alias;
