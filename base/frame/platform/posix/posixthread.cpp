@@ -185,7 +185,7 @@ void PosixThread::cancel()
 
 bool PosixThread::join()
 {
-    if (isAdopted || pthread_join(thread, nullptr) != 0)
+    if (isAdopted || isCurrent() || pthread_join(thread, nullptr) != 0)
         return false;
     release();
     return true;

@@ -3,6 +3,15 @@
 #include "foundation/object/fatomic.h"
 #include "foundation/thread/flockscope.h"
 
+namespace
+{
+/// The counts of waiting threads change outside the guard too.
+int32 read(volatile int32& count)
+{
+    return FAtomicAdd(count, 0);
+}
+} // namespace
+
 FRwLock::FRwLock(const char*) {}
 
 bool FRwLock::tryRead()
@@ -35,7 +44,7 @@ void FRwLock::wakeReaders()
     // A reader that was about to wait when the signal came may have found it used up by another; and no reader
     // signals readers when it is done.
     FLockScope guard(accessGuard);
-    if (waitingReaders > 0)
+    if (read(waitingReaders) > 0)
         canRead.signalAll();
 }
 
@@ -43,7 +52,7 @@ void FRwLock::doneReading()
 {
     FLockScope guard(accessGuard);
     FAtomicDecrement(readerCount);
-    if (waitingWriters > 0)
+    if (read(waitingWriters) > 0)
         canWrite.signalAll();
 }
 
@@ -74,15 +83,15 @@ void FRwLock::doneWriting()
 {
     FLockScope guard(accessGuard);
     FAtomicDecrement(writerCount);
-    if (waitingWriters > 0)
+    if (read(waitingWriters) > 0)
         canWrite.signalAll();
     // The writer's thread stays noted; the count is asked first.
-    if (waitingReaders > 0)
+    if (read(waitingReaders) > 0)
         canRead.signalAll();
 }
 
 bool FRwLock::verify()
 {
     FLockScope guard(accessGuard);
-    return readerCount >= 0 && writerCount >= 0;
+    return readerCount >= 0 && writerCount >= 0 && read(waitingReaders) >= 0 && read(waitingWriters) >= 0;
 }
