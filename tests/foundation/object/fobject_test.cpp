@@ -30,6 +30,15 @@ class Mortal : public CmObject
     int* report;
 };
 
+/// Says that it goes.
+class Announcing : public CmObject
+{
+    DECLARE_COPYABLE(Announcing, CmObject)
+
+    Announcing() = default;
+    ~Announcing() override { changed(kMessageDestroyed); }
+};
+
 /// Notes what it hears.
 class Listener : public CmObject
 {
@@ -266,6 +275,18 @@ TEST(GuardPtr, ForgetsATargetThatDies)
     EXPECT_EQ(handler.pairs.size(), 1u);
     copied = nullptr;
     EXPECT_TRUE(handler.pairs.empty());
+}
+
+TEST(GuardPtr, ReadsNullAfterTheEndOfItsTarget)
+{
+    SimpleHandler handler;
+    auto* target = new Announcing;
+    const GuardPtr<CmObject> guard(target);
+    target->addRef();
+    target->release();
+    EXPECT_EQ(guard.get(), target);
+    target->release();
+    EXPECT_EQ(guard.get(), nullptr);
 }
 
 TEST(GuardPtr, LeavesNoDependencyBehind)

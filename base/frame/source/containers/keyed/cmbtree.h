@@ -38,7 +38,6 @@ class CmBTree : public CmContainer
     CmBTreeNode* lookupNode(const CmObject* object) const;
     int getOrder() const { return _order; }
 
-protected:
     /// As `lookupNode`, below `root`, and the place in the node.
     CmBTreeNode* nodeSearch(CmBTreeNode* root, const CmObject* object, int& index) const;
 
@@ -62,7 +61,7 @@ private:
     CmBTreeNode* _root = nullptr;
 };
 
-/// Walks over a CmBTree in order.
+/// Walks over a CmBTree in order. One thread at a time.
 class CmBTreeIterator : public CmIterator
 {
 public:

@@ -78,7 +78,7 @@ private:
     HashFunction _hashFunction = nullptr;
 };
 
-/// Walks over a CmHashTable. Going backwards costs a walk through a chain.
+/// Walks over a CmHashTable. Going backwards costs a walk through a chain. One thread at a time.
 class CmHashTableIterator : public CmIterator
 {
 public:

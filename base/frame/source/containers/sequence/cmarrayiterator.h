@@ -2,7 +2,7 @@
 
 #include "containers/sequence/cmiterator.h"
 
-/// Walks over the places of a CmArray or CmOrderedArray by index.
+/// Walks over the places of a CmArray or CmOrderedArray by index. One thread at a time.
 class CmArrayIterator : public CmIterator
 {
 public:

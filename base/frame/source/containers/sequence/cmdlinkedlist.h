@@ -22,7 +22,7 @@ struct CmNodeRules<CmDLinkedNode>
 
 extern template class CmNodeList<CmDLinkedNode>;
 
-/// A doubly linked list of objects, one node an element.
+/// A doubly linked list of objects, one node an element. One thread at a time.
 class CmDLinkedList : public CmNodeList<CmDLinkedNode>
 {
     DECLARE_CLASS(CmDLinkedList, CmContainer)

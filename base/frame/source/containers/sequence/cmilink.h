@@ -3,6 +3,7 @@
 #include "foundation/object/cmobject.h"
 
 /// An element that carries its own link: it can stand in only one CmILinkedList at a time. A copy stands in none.
+/// One thread at a time.
 class CmILink : public CmObject
 {
     DECLARE_CLASS(CmILink, CmObject)
@@ -16,6 +17,7 @@ class CmILink : public CmObject
 };
 
 /// An element that carries its own links: it can stand in only one CmIDLinkedList at a time. A copy stands in none.
+/// One thread at a time.
 class CmIDLink : public CmObject
 {
     DECLARE_CLASS(CmIDLink, CmObject)

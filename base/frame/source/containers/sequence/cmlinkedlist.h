@@ -23,6 +23,7 @@ struct CmNodeRules<CmLinkedNode>
 extern template class CmNodeList<CmLinkedNode>;
 
 /// A singly linked list of objects, one node an element. Going backwards is slow; CmDLinkedList exists for that.
+/// One thread at a time.
 class CmLinkedList : public CmNodeList<CmLinkedNode>
 {
     DECLARE_CLASS(CmLinkedList, CmContainer)

@@ -17,6 +17,7 @@ template <class Node>
 struct CmNodeRules;
 
 /// What the four lists of objects share. It stands between CmContainer and them, and is no class of the object model.
+/// One thread at a time.
 template <class Node>
 class CmNodeList : public CmContainer
 {
@@ -79,7 +80,7 @@ protected:
     Node* _last = nullptr;
 };
 
-/// Walks over a list of objects.
+/// Walks over a list of objects. One thread at a time.
 template <class Node>
 class CmNodeListIterator : public CmIterator
 {

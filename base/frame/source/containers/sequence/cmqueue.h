@@ -2,7 +2,7 @@
 
 #include "containers/sequence/cmlinkedlist.h"
 
-/// First in, first out.
+/// First in, first out. One thread at a time.
 class CmQueue : public CmLinkedList
 {
     DECLARE_CLASS(CmQueue, CmLinkedList)

@@ -2,7 +2,7 @@
 
 #include "containers/sequence/cmlinkedlist.h"
 
-/// Last in, first out; iteration begins at the top.
+/// Last in, first out; iteration begins at the top. One thread at a time.
 class CmStack : public CmLinkedList
 {
     DECLARE_CLASS(CmStack, CmLinkedList)

@@ -6,6 +6,7 @@
 /// Values under keys in the order of insertion, searched one by one: for a few of them.
 ///
 /// As an array it allows a key twice; `set` and `addUnique` do not. The first one counts in a search.
+/// One thread at a time.
 template <class Key, class Value>
 class TAssociationArray : public TArray<TAssociation<Key, Value>>
 {

@@ -6,6 +6,7 @@
 ///
 /// Made by `newIterator` and deleted by the caller. It knows nothing of changes in the container. Where there is no
 /// element, an operation gives the empty value `T()`. References stay good until the container changes.
+/// One thread at a time.
 template <class T>
 class TIterator
 {

@@ -4,6 +4,7 @@
 #include "containers/typed/thashtable.h"
 
 /// A hash table of values under unique keys. `hashKey` gives a bucket number below `size`.
+/// One thread at a time.
 template <class Key, class Value, unsigned (*hashKey)(const Key& key, unsigned size)>
 class THashDictionary
 {

@@ -25,6 +25,7 @@ class THashTableIterator;
 /// Chained hash table of values with a fixed number of buckets; the chains grow without bound.
 ///
 /// The order of iteration is that of the buckets, and in each the order of insertion. Duplicates are allowed.
+/// One thread at a time.
 template <class T>
 class THashTable : public TContainer<T>
 {

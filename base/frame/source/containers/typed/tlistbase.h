@@ -6,6 +6,7 @@ template <class T, class Node>
 class TListIterator;
 
 /// What the two typed lists share. `Node` has `next` and `value`, and says what it knows of its predecessor.
+/// One thread at a time.
 template <class T, class Node>
 class TListBase : public TContainer<T>
 {

@@ -2,7 +2,7 @@
 
 class FUnknown;
 
-/// A loaded library of components. It stays loaded while it has instances.
+/// A loaded library of components. It stays loaded while it has instances. Main thread.
 class FModule
 {
 public:

@@ -15,7 +15,8 @@ protected:
     Owner* owner;
 };
 
-/// Hands the changes that it hears of to `Owner::onUpdate(CmObject* changedObject, int message)`.
+/// Hands the changes that it hears of to `Owner::onUpdate(CmObject* changedObject, int message)`. One thread at a
+/// time.
 template <class Owner>
 class CmObjectUpdateObserver : public CmObjectObserverBase<Owner>
 {
@@ -31,8 +32,8 @@ class CmObjectUpdateObserver : public CmObjectObserverBase<Owner>
 
 /// A pointer to an object that clears itself when the object is destroyed. It holds no reference.
 ///
-/// It hears of the end as a dependent of the object, through the process-wide update handler: without one it stays
-/// as it is. Main thread.
+/// It hears of the end as a dependent of the object, through the process-wide update handler. So it serves objects
+/// that announce their end by `changed(kMessageDestroyed)`, and while there is a handler. Main thread.
 template <class T>
 class GuardPtr
 {

@@ -7,7 +7,7 @@
 /// Holds one reference on any FUnknown descendant; null is legal.
 ///
 /// Taking a pointer adds a reference. Use `adopt` for a pointer whose reference is already the caller's: a result of
-/// `new`, `newCopy`, `queryInterface` or a factory.
+/// `new`, `newCopy`, `queryInterface` or a factory. One thread at a time.
 template <class T>
 class IPtr
 {

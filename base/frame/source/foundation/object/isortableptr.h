@@ -2,7 +2,8 @@
 
 #include "foundation/object/iptr.h"
 
-/// An IPtr that TOrderedArray keeps in the order of `comparer`, which gives less than, equal to or more than 0.
+/// An IPtr that TOrderedArray keeps in the order of `comparer`, which gives less than, equal to or more than 0. One
+/// thread at a time.
 template <class T, int (*comparer)(const T* left, const T* right)>
 class ISortablePtr : public IPtr<T>
 {
