@@ -72,9 +72,6 @@ TEST(AllClasses, AreWhatTheySay)
         const IPtr<FUnknown> unknown = adopt(meta->createFunction ? meta->createFunction() : nullptr);
         if (!unknown)
             continue;
-        // A wrapper of foreign objects has no identity to be asked for.
-        if (strcmp(meta->className, "CmDelegatingUnknown") == 0)
-            continue;
         CmObject* object = toCmObject(unknown);
         ASSERT_TRUE(object) << "not a CmObject";
         EXPECT_EQ(object->getRefCount(), 1u);

@@ -18,3 +18,21 @@ unsigned CmAssociation::hash(unsigned size) const
 {
     return key ? key->hash(size) : CmObject::hash(size);
 }
+
+void CmAssociation::handOver()
+{
+    static_cast<void>(heldKey.take());
+    static_cast<void>(heldObject.take());
+}
+
+bool CmAssociation::restorePair(CmObject* restoredKey, CmObject* restoredObject)
+{
+    const bool isWhole = restoredKey && restoredObject;
+    heldKey = adopt(restoredKey);
+    heldObject = adopt(restoredObject);
+    if (!isWhole)
+        heldKey = heldObject = nullptr;
+    key = heldKey;
+    object = heldObject;
+    return isWhole;
+}

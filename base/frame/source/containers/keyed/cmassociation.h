@@ -1,10 +1,12 @@
 #pragma once
 
 #include "foundation/object/cmobject.h"
+#include "foundation/object/iptr.h"
 
 /// A key with its object, as the dictionaries hold it. Equality, order and hash look at the key alone.
 ///
-/// It owns neither: the container that holds it does the releasing. A copy shares both. One thread at a time.
+/// It owns neither: the container that holds it does the releasing. Only what it was restored with from a file lives
+/// as long as the association. A copy shares both. One thread at a time.
 class CmAssociation : public CmObject
 {
     DECLARE_CLASS(CmAssociation, CmObject)
@@ -18,6 +20,8 @@ class CmAssociation : public CmObject
     CmObject* getObject() const { return object; }
     void setKey(CmObject* newKey) { key = newKey; }
     void setObject(CmObject* newObject) { object = newObject; }
+    /// Gives the references on what was restored to the caller, who is going to release key and object.
+    void handOver();
 
     /// False without a key, as for anything but an association.
     bool isEqual(const CmObject* other) const override;
@@ -30,6 +34,11 @@ class CmAssociation : public CmObject
     bool restoreAttributes(FAttributes& attributes) override;
 
 private:
+    /// Takes over the references on a whole pair; half a pair is given back, and the result is false.
+    bool restorePair(CmObject* restoredKey, CmObject* restoredObject);
+
     CmObject* key = nullptr;
     CmObject* object = nullptr;
+    IPtr<CmObject> heldKey;
+    IPtr<CmObject> heldObject;
 };

@@ -39,6 +39,7 @@ protected:
     ~CmDictionaryOf() override { CmDictionaryOf::removeAll(); }
 
     bool addFromOther(CmObject* element) override;
+    bool addRestored(CmObject* element) override;
 
 private:
     /// What an association holds, kept beyond its end.

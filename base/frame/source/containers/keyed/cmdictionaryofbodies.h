@@ -22,10 +22,13 @@ bool CmDictionaryOf<Container>::add(CmObject* key, CmObject* object)
 template <class Container>
 bool CmDictionaryOf<Container>::add(CmObject* object)
 {
-    const CmAssociation* association = FCast(CmAssociation, object);
-    if (!association || !association->getKey() || lookupAssoc(association->getKey()))
+    CmAssociation* association = FCast(CmAssociation, object);
+    if (!association || !association->getKey() || lookupAssoc(association->getKey()) ||
+        !Container::add(object))
         return false;
-    return Container::add(object);
+    if (this->_ownsObjects != CmContainer::kShared)
+        association->handOver();
+    return true;
 }
 
 template <class Container>
@@ -133,6 +136,20 @@ bool CmDictionaryOf<Container>::addFromOther(CmObject* element)
             member->release();
     }
     return isAdded;
+}
+
+template <class Container>
+bool CmDictionaryOf<Container>::addRestored(CmObject* element)
+{
+    // An attribute tree may give the same association to several dictionaries, so each makes its own.
+    const IPtr<CmObject> restored = adopt(element);
+    const CmAssociation* association = FCast(CmAssociation, element);
+    if (!association || !add(association->getKey(), association->getObject()))
+        return false;
+    association->getKey()->addRef();
+    if (association->getObject())
+        association->getObject()->addRef();
+    return true;
 }
 
 // What an association that has left held; in mode 0 the association itself is still to be released.

@@ -163,6 +163,14 @@ bool CmContainer::addFromOther(CmObject* element)
     return false;
 }
 
+bool CmContainer::addRestored(CmObject* element)
+{
+    if (add(element))
+        return true;
+    element->release();
+    return false;
+}
+
 // Through a filter
 
 bool CmContainer::query(CmObjectFilter& filter, CmContainer& result) const

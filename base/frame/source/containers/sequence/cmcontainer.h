@@ -116,6 +116,8 @@ protected:
     void testDelete(CmObject* object) const;
     /// Adds an element of another container, or a copy of it, as the mode says.
     virtual bool addFromOther(CmObject* element);
+    /// Adds an element that was restored from a file, and takes over the reference on it in any case.
+    virtual bool addRestored(CmObject* element);
 
     int32 _size = 0;
     int16 _ownsObjects = kShared;

@@ -33,10 +33,8 @@ void CmDelegatingUnknown::setModule(FModule* owner)
 
 int32 CmDelegatingUnknown::queryInterface(const char* interfaceID, void** object)
 {
-    if (delegate)
-        return delegate->queryInterface(interfaceID, object);
-    *object = nullptr;
-    return kNoInterface;
+    return delegate ? delegate->queryInterface(interfaceID, object)
+                    : CmObject::queryInterface(interfaceID, object);
 }
 
 bool CmDelegatingUnknown::isEqual(const CmObject* other) const

@@ -8,8 +8,9 @@ class FModule;
 /// Lets an object that is known only as FUnknown stand in containers and archives of CmObjects.
 ///
 /// The wrapper has no identity of its own: what it is asked for, the delegate answers, so it cannot be reached
-/// again from what it returns. Its count of references is its own. While it lives, its module stays loaded; a copy
-/// shares the delegate but doesn't hold the module. Beware: two wrappers of one module are equal, whatever they wrap.
+/// again from what it returns. Only an empty one answers for itself, so that an archive can make and fill it. Its
+/// count of references is its own. While it lives, its module stays loaded; a copy shares the delegate but doesn't
+/// hold the module. Beware: two wrappers of one module are equal, whatever they wrap. One thread at a time.
 class CmDelegatingUnknown : public CmObject
 {
     DECLARE_CLASS(CmDelegatingUnknown, CmObject)

@@ -7,27 +7,12 @@ namespace
 constexpr const char* kKey = "Key";
 constexpr const char* kObject = "Obj";
 
-// With a reference for the container that will own the association's parts.
 CmObject* takeObject(const FAttributes& attributes, const char* key)
 {
     CmObject* object = attributes.getObject(key, "CmObject");
     if (object)
         object->addRef();
     return object;
-}
-
-// Half a pair is given back.
-bool keepPair(CmObject*& key, CmObject*& object)
-{
-    if (key && object)
-        return true;
-    for (CmObject** half : {&key, &object})
-    {
-        if (*half)
-            (*half)->release();
-        *half = nullptr;
-    }
-    return false;
 }
 } // namespace
 
@@ -38,9 +23,8 @@ bool CmAssociation::externalize(FArchive& archive) const
 
 bool CmAssociation::internalize(FArchive& archive)
 {
-    key = archive.readObject("CmObject", true);
-    object = archive.readObject("CmObject", true);
-    return keepPair(key, object);
+    CmObject* restoredKey = archive.readObject("CmObject", true);
+    return restorePair(restoredKey, archive.readObject("CmObject", true));
 }
 
 bool CmAssociation::storeAttributes(FAttributes& attributes) const
@@ -51,7 +35,5 @@ bool CmAssociation::storeAttributes(FAttributes& attributes) const
 
 bool CmAssociation::restoreAttributes(FAttributes& attributes)
 {
-    key = takeObject(attributes, kKey);
-    object = takeObject(attributes, kObject);
-    return keepPair(key, object);
+    return restorePair(takeObject(attributes, kKey), takeObject(attributes, kObject));
 }

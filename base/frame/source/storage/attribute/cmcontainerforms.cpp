@@ -1,4 +1,3 @@
-#include "containers/keyed/cmassociation.h"
 #include "containers/sequence/cmcontainer.h"
 #include "containers/sequence/cmiterator.h"
 #include "storage/attribute/farchive.h"
@@ -11,16 +10,6 @@ namespace
 {
 constexpr const char* kOwnership = "ownership";
 constexpr const char* kElement = "obj";
-
-// Gives back an element that the container refused. An association came with references on what it holds.
-void discard(CmObject* element)
-{
-    if (const CmAssociation* association = FCast(CmAssociation, element))
-        for (CmObject* held : {association->getKey(), association->getObject()})
-            if (held)
-                held->release();
-    element->release();
-}
 } // namespace
 
 bool CmContainer::externalize(FArchive& archive) const
@@ -43,9 +32,7 @@ bool CmContainer::internalize(FArchive& archive)
     for (int i = 0; isRead && i < count; i++)
     {
         CmObject* object = archive.readObject("CmObject", true);
-        isRead = add(object);
-        if (object && !isRead)
-            discard(object);
+        isRead = object && addRestored(object);
     }
     _ownsObjects = mode;
     return isRead;
@@ -68,8 +55,7 @@ bool CmContainer::restoreAttributes(FAttributes& attributes)
     int16 mode = kShared;
     attributes.get(kOwnership, mode);
     while (CmObject* object = attributes.unqueueObject(kElement, "CmObject"))
-        if (!add(object))
-            discard(object);
+        addRestored(object);
     _ownsObjects = mode;
     return true;
 }
