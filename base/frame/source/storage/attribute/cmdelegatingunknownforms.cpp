@@ -23,13 +23,14 @@ bool getClassID(IPersistent& persistent, CmUID& uid)
 bool CmDelegatingUnknown::externalize(FArchive& archive) const
 {
     const IPtr<IPersistent> persistent = adopt(askInterface<IPersistent>(delegate));
-    FAttributes attributes;
+    // The archive knows by their addresses the texts and objects that it wrote, so these stay as long as it does.
+    auto* attributes = new FAttributes;
+    archive.forgetLater(attributes);
     CmUID uid;
-    if (!persistent || persistent->saveAttributes(&attributes) != kResultOk ||
-        !::getClassID(*persistent, uid))
+    if (!persistent || persistent->saveAttributes(attributes) != kResultOk || !::getClassID(*persistent, uid))
         return false;
     uid.externalize(archive);
-    return attributes.externalize(archive);
+    return attributes->externalize(archive);
 }
 
 bool CmDelegatingUnknown::internalize(FArchive& archive)
