@@ -90,15 +90,20 @@ TEST(FBinArchive, WritesEachKindOfObject)
     tree.setObject("g", node);
     tree.setObject("h", node);
     tree.queueObject("i", node);
+    tree.entry("j").setUnknown(static_cast<FUnknown*>(node.get()), FAttributeValue::kBorrowed);
     const std::string one = le<int32>(1);
     const std::string subBytes = one + entry("n", 1) + le<int64>(1);
     const std::string nodeBytes = stored("StoredNode") + idOf(node) + one + entry("Number", 1) + le<int64>(1);
     EXPECT_EQ(hex(save(tree)),
-              hex(le<int32>(9) + object("a", 6) + subBytes + object("b", 7) + le<int32>(3) + "xyz" +
+              hex(le<int32>(10) + object("a", 6) + subBytes + object("b", 7) + le<int32>(3) + "xyz" +
                   object("c", 2) + one + le<int64>(9) + object("d", 3) + one + le(0.5) + object("e", 4) +
                   one + le<int32>(5) + "z" + '\0' + "\xEF\xBB\xBF" + object("f", 5) + one + subBytes +
                   object("g", 20) + nodeBytes + object("h", 21) + idOf(node) + object("i", 201) + one +
-                  le<uint16>(21) + idOf(node)));
+                  le<uint16>(21) + idOf(node) + entry("j", 258) + le<uint16>(21) + idOf(node)));
+    FAttributes read;
+    ASSERT_TRUE(load(save(tree), read));
+    EXPECT_TRUE(read.getObject("j", "StoredNode"));
+    EXPECT_EQ(read.getObject("j", "StoredNode"), read.getObject("g", nullptr));
 }
 
 TEST(FBinArchive, WritesAndReadsRoots)

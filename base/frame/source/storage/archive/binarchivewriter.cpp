@@ -26,6 +26,13 @@ int countArchived(const FAttributes& attributes)
     return count;
 }
 
+/// The kind under which an entry is stored: of an unknown it is its object that is.
+uint16 getStoredKind(const FAttributeValue& value)
+{
+    const unsigned kind = value.getKind();
+    return static_cast<uint16>(kind == FAttributeValue::kUnknown ? kind | FAttributeValue::kObject : kind);
+}
+
 /// The length of 16-bit text that has only ASCII characters; -1 for any other.
 int asciiLength(const char16* text)
 {
@@ -138,7 +145,7 @@ bool BinArchiveWriter::writeEntry(FStringIDAttribute& entry)
         return true;
     writeText8(entry.getKey());
     const unsigned type = entry.getType();
-    writeNumber<uint16>(static_cast<uint16>(entry.getKind()));
+    writeNumber<uint16>(getStoredKind(entry));
     if (type & FAttributeValue::kInteger)
         writeNumber<int64>(entry.getLong());
     else if (type & FAttributeValue::kFloat)
