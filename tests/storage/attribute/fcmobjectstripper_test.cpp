@@ -79,6 +79,29 @@ TEST_F(Stripper, CirclesAreMadeAgainAndNeverLeak)
     first->nextNode()->next = nullptr;
 }
 
+TEST_F(Stripper, ObjectsThatWereMadeOfPlaceholdersAreStrippedAnew)
+{
+    FAttributes tree;
+    {
+        auto second = adopt(new StoredNode(2));
+        tree.setObject("a", adopt(new StoredNode(1, second)));
+        tree.setObject("b", second);
+        tree.queueObject("q", second);
+    }
+    tree.stripObjects();
+    auto* made = FCast(StoredNode, tree.getObject("b", "StoredNode"));
+    ASSERT_TRUE(made);
+    made->number = 5;
+    tree.stripObjects();
+    EXPECT_EQ(StoredNode::alive, before) << "neither at its places nor behind the placeholder of another";
+
+    auto* first = FCast(StoredNode, tree.getObject("a", "StoredNode"));
+    ASSERT_TRUE(first && first->nextNode());
+    EXPECT_EQ(first->nextNode()->number, 5);
+    EXPECT_EQ(tree.getObject("b", nullptr), first->nextNode());
+    EXPECT_EQ(adopt(tree.unqueueObject("q", nullptr)).get(), first->nextNode());
+}
+
 TEST_F(Stripper, LongChainsDoNotExhaustTheStack)
 {
     constexpr int length = 50000;

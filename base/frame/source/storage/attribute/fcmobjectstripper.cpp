@@ -11,8 +11,22 @@ namespace
 /// What trees hold and files know as such.
 bool isPlainData(const CmObject* object)
 {
-    return FCast(FXmlObject, object) || FCast(FAttrList, object) || FCast(FAttrBuffer, object) ||
-           FCast(CmBuffer, object) || FCast(FMemoryStream, object);
+    return FCast(FAttrList, object) || FCast(FAttrBuffer, object) || FCast(CmBuffer, object) ||
+           FCast(FMemoryStream, object);
+}
+
+FXmlInstance* getInstance(CmObject* object)
+{
+    auto* placeholder = FCast(FXmlObject, object);
+    return placeholder ? placeholder->getInstance() : nullptr;
+}
+
+/// The object at a place of a tree, or that which was made of the placeholder there; null where neither is.
+CmObject* getLiveObject(CmObject* object)
+{
+    if (const FXmlInstance* instance = getInstance(object))
+        return instance->getMadeObject();
+    return FCast(FXmlObject, object) || isPlainData(object) ? nullptr : object;
 }
 } // namespace
 
@@ -51,26 +65,38 @@ bool FCmObjectStripper::stripValue(FAttributeValue& value, CmHashTable& seen)
             stripAttributes(*trees->at(i), seen);
     else if (auto* list = FCast(FObjectList, object))
         stripList(*list, seen);
-    else if (object && !isPlainData(object))
+    else if (CmObject* live = getLiveObject(object))
     {
-        FXmlObject* placeholder = stripObject(object, seen);
+        FXmlObject* placeholder = stripObject(live, seen);
         value.setObj(placeholder, FAttributeValue::kOwned);
         return placeholder != nullptr;
     }
     else if (value.getKind() == FAttributeValue::kUnknown)
         return false;
+    else
+        stripStored(object);
     return true;
+}
+
+/// Has the tree behind a placeholder stripped too: it may lead to objects that were made.
+void FCmObjectStripper::stripStored(CmObject* object)
+{
+    FXmlInstance* instance = getInstance(object);
+    if (instance && instance->getStoredAttributes() && met.insert(instance).second)
+        waiting.push_back(instance);
 }
 
 void FCmObjectStripper::stripList(FObjectList& list, CmHashTable& seen)
 {
     for (int i = 0; i < list.total();)
     {
-        const bool isPlain = isPlainData(list.at(i));
-        auto placeholder = isPlain ? nullptr : adopt(stripObject(list.at(i), seen));
+        CmObject* live = getLiveObject(list.at(i));
+        auto placeholder = live ? adopt(stripObject(live, seen)) : nullptr;
         if (placeholder)
             list.replaceAt(i, placeholder);
-        if (placeholder || isPlain)
+        else if (!live)
+            stripStored(list.at(i));
+        if (placeholder || !live)
             i++;
         else
             list.removeAt(i);
@@ -88,6 +114,7 @@ FXmlObject* FCmObjectStripper::stripObject(CmObject* object, CmHashTable& seen)
         auto instance = adopt(new FXmlInstance(reference->getID(), object->getClass()->persistentName, tree));
         stripped.push_back(object);
         seen.add(instance);
+        met.insert(instance);
         waiting.push_back(instance);
         linker.addInstance(instance);
         if (!holder)

@@ -3,6 +3,7 @@
 #include "containers/keyed/cmhashtable.h"
 #include "storage/attribute/fxmllinker.h"
 
+#include <unordered_set>
 #include <vector>
 
 class FAttributeValue;
@@ -11,8 +12,8 @@ class FObjectList;
 /// Makes attribute trees free of live objects, so that they can be stored or sent without them.
 ///
 /// Each object in the tree gives place to a placeholder with what the object stores of itself, which is stripped in
-/// turn; at its further places, and inside what objects store, it gives place to references. Objects that can't store
-/// themselves are dropped.
+/// turn; at its further places, and inside what objects store, it gives place to references. So do placeholders whose
+/// objects were made; the others stay, with their trees stripped. Objects that can't store themselves are dropped.
 /// One thread at a time; for one tree.
 class FCmObjectStripper
 {
@@ -27,10 +28,13 @@ public:
 private:
     bool stripValue(FAttributeValue& value, CmHashTable& seen);
     void stripList(FObjectList& list, CmHashTable& seen);
+    void stripStored(CmObject* object);
 
     FXmlLinker linker;
     FXmlInstance* holder = nullptr;
     std::vector<IPtr<FXmlInstance>> waiting;
+    /// The placeholders that are or were waiting.
+    std::unordered_set<const FXmlInstance*> met;
     /// Keeps the objects, and with them their addresses, until all are stripped.
     std::vector<IPtr<CmObject>> stripped;
 };
