@@ -55,6 +55,26 @@ TEST_F(Start, SpeaksTheLanguageOfTheDescriptionAndRemembersIt)
     EXPECT_EQ(contentsOf(userFile("language")), attributeFile("language", {{"language", "de"}}));
 }
 
+TEST_F(Start, LoadsTheSettingsAndSavesThemAtTheEnd)
+{
+    const std::string settings =
+        "<Defaults><rootObjects><root name=\"Defaults\"><list name=\"Entries\" type=\"list\"><item>"
+        "<string name=\"Group\" value=\"g\"/><int name=\"Version\" value=\"3\"/>"
+        "<member name=\"Values\"><int name=\"k\" value=\"7\"/></member>"
+        "</item></list></root></rootObjects></Defaults>";
+    writeUserFile("Defaults", settings);
+    run({});
+    const std::string saved = contentsOf(userFile("Defaults"));
+    EXPECT_HOLDS(saved, "<string name=\"Group\" value=\"g\"/>\r");
+    EXPECT_HOLDS(saved, "<int name=\"k\" value=\"7\"/>\r");
+    EXPECT_FALSE(exists(userFile("Defaults_old")));
+
+    std::filesystem::remove(userFile("Defaults"));
+    run({});
+    const auto mode = std::filesystem::status(userFile("Defaults")).permissions();
+    EXPECT_EQ(mode, std::filesystem::perms(0600));
+}
+
 TEST_F(Start, OfASecondProcessAddsToTheUploadsOfTheFirst)
 {
     logIn();

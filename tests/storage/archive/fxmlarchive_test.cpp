@@ -179,6 +179,36 @@ TEST(FXmlArchive, EveryKindComesBackAndIsSavedAgainAsItWas)
     EXPECT_EQ(StoredNode::alive, before);
 }
 
+TEST(FXmlArchive, EveryCharacterComesBackInKeysAndTexts)
+{
+    FAttributes tree;
+    for (int c = 1; c < 256; c++)
+        tree.set((std::string("k") + static_cast<char>(c)).c_str(),
+                 std::string(2, static_cast<char>(c)).c_str());
+    std::u16string wide;
+    for (char16 c = 1; c < 0x800; c++)
+    {
+        wide = {c, c, u'-', c};
+        tree.set(("w" + std::to_string(c)).c_str(), wide.c_str());
+        tree.queueString16("q", wide.c_str());
+    }
+    tree.set("x", u"\U0001F3B5\u3042\uFFFD\uFEFF");
+    FAttributes read;
+    ASSERT_TRUE(load(save(tree), read));
+    ASSERT_EQ(read.total(), tree.total());
+    for (int i = 0; i < tree.total(); i++)
+    {
+        FString expected, text;
+        ASSERT_STREQ(read.entryAt(i)->getKey(), tree.entryAt(i)->getKey());
+        const bool isText = tree.entryAt(i)->getString(expected);
+        ASSERT_EQ(read.entryAt(i)->getString(text), isText);
+        EXPECT_EQ(text.isWideString(), expected.isWideString()) << tree.entryAt(i)->getKey();
+        EXPECT_EQ(text, expected) << tree.entryAt(i)->getKey();
+    }
+    for (FString expected, text; tree.unqueueString("q", expected);)
+        EXPECT_TRUE(read.unqueueString("q", text) && text == expected);
+}
+
 TEST(FXmlArchive, FloatsAreWrittenAsByPrintfAndComeBackBitForBit)
 {
     std::mt19937_64 random(7);
