@@ -205,6 +205,33 @@ TEST_F(ArchiveFiles, AreRenamedWithTheirType)
     EXPECT_EQ(*FFileType::getTypeByString(u"xml"), FXmlArchive::fileTypeNormal());
 }
 
+TEST_F(ArchiveFiles, NamesKeepWhatStandsBehindADot)
+{
+    const StoredNode first(1), second(2);
+    FAttributes tree;
+    tree.set("n", 1);
+    EXPECT_TRUE(FXmlArchive::saveAttributes(u"a.b", "root", tree));
+    tree.set("n", 2);
+    EXPECT_TRUE(FXmlArchive::saveAttributes(u"a.c", "root", tree));
+    EXPECT_TRUE(exists("config/user/a.b.xml") && exists("config/user/a.c.xml"));
+    EXPECT_TRUE(FXmlArchive::loadAttributes(u"a.b", "root", tree));
+    EXPECT_EQ(tree.getInt("n"), 1) << "a file of its own";
+    EXPECT_TRUE(FXmlArchive::saveAttributes(u"a.b", "root", tree));
+    EXPECT_FALSE(exists("config/user/a.b_old.xml"));
+    EXPECT_TRUE(FXmlArchive::backupObjectArchive(u"a.b"));
+    EXPECT_TRUE(exists("config/user/a.b.xml.backup"));
+    EXPECT_TRUE(FXmlArchive::renameObjectArchive(u"a.b", u"version 1.2"));
+    EXPECT_TRUE(exists("config/user/version 1.2.xml"));
+    EXPECT_FALSE(FXmlArchive::restoreObjectArchive(u"a.b")) << "there is nothing to remove";
+    EXPECT_TRUE(exists("config/user/a.b.xml")) << "but the backup is put back";
+    put("app/a.d.xml", "<root><int name='n' value='3'/></root>");
+    EXPECT_TRUE(FXmlArchive::loadAttributes(u"a.d", "root", tree));
+    EXPECT_TRUE(FNewArchive::storeObject(u"a.b", &first) && FNewArchive::storeObject(u"a.c", &second));
+    StoredNode restored;
+    EXPECT_TRUE(exists("config/user/a.b.bin") && FNewArchive::restoreObject(u"a.b", &restored));
+    EXPECT_EQ(restored.number, 1);
+}
+
 TEST_F(ArchiveFiles, WithoutAUserFolderNothingIsWrittenAnywhere)
 {
     IStandardFolders::setInstance(nullptr);

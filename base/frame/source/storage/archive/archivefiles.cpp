@@ -15,8 +15,10 @@ bool isUsable(const FNPath& path)
 
 FNPath getArchivePath(const char16* name, int standardFolder, const FFileType& type)
 {
-    FNPath path(name, standardFolder, FPath::kFile, nullptr, standardFolder == FNPath::kUserFolder);
+    FNPath path(nullptr, standardFolder, FPath::kFile, nullptr, standardFolder == FNPath::kUserFolder);
+    // The type goes first: set on a name, it would replace what stands behind a dot there.
     path.setFileType(type);
+    path.setName(name);
     path.updateExtension(false);
     return path;
 }

@@ -7,7 +7,7 @@ class FStream;
 
 // The files of the archives in the standard folders, by name without folder and extension.
 
-/// A file of that type in a standard folder. The user folder is made where it is missing.
+/// A file of that type in a standard folder; a name may hold dots. The user folder is made where it is missing.
 FNPath getArchivePath(const char16* name, int standardFolder, const FFileType& type);
 
 bool archiveFileExists(const char16* name, const FFileType& type);
