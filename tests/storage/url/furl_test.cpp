@@ -1,6 +1,8 @@
 #include "storage/url/furl.h"
 
 #include "storage/attribute/fattributes.h"
+#include "storage/attribute/fnewarchive.h"
+#include "storage/stream/fmemorystream.h"
 #include "storage/url/furlfilehandler.h"
 #include "storage/url/urlpathconverter.h"
 #include "tests/storage/filefixture.h"
@@ -94,7 +96,7 @@ TEST_F(FUrlTest, AnotherTextTakesNothingAlong)
     EXPECT_EQ(described(url), "http|||other|80|y|http://other:80|y|0")
         << "but the protocol, where it has none";
     url.setUrl(u"gopher://z");
-    EXPECT_EQ(urlOf(url), "gopher://z/") << "and no port";
+    EXPECT_EQ(urlOf(url), "gopher://z:80/") << "and the port, where nobody knows another";
 }
 
 TEST_F(FUrlTest, PortsReachBeyondASignedNumber)
@@ -172,6 +174,40 @@ TEST_F(FUrlTest, MovesLikeAPath)
     EXPECT_FALSE(FUrl(u"file:///a/b").isRootDir());
     url.setFile(u"a b", true);
     EXPECT_EQ(urlOf(url), "http://h:1/a%20b");
+}
+
+TEST_F(FUrlTest, NamesThatThePathMakesReachTheUrl)
+{
+    FUrl url(u"http://h:1/a.b/song.wav?x");
+    url.setFileType(FFileType(nullptr, "xml", "xml", 0, "XML"));
+    EXPECT_EQ(urlOf(url), "http://h:1/a.b/song.xml");
+    EXPECT_EQ(utf8(url.getName()), "song.xml");
+
+    put("take.wav", "");
+    put("take-01.wav", "");
+    FUrl taken(FString(("file://" + root + "/take.wav").c_str()).text16());
+    EXPECT_TRUE(taken.uniqueName());
+    EXPECT_EQ(urlOf(taken), "file://" + root + "/take-02.wav");
+}
+
+TEST_F(FUrlTest, ArchiveRoundTrip)
+{
+    const IPtr<FMemoryStream> stream = adopt(new FMemoryStream);
+    const FUrl url(u"http://a:b@h:45678/x/y");
+    {
+        FNewArchive archive(stream, true);
+        EXPECT_TRUE(url.externalize(archive));
+    }
+    for (const bool isWhole : {true, false})
+    {
+        if (!isWhole)
+            stream->setSize(stream->getSize() - 4);
+        stream->rewind();
+        FNewArchive archive(stream, false);
+        FUrl restored(u"file:///z");
+        EXPECT_EQ(restored.internalize(archive), isWhole);
+        EXPECT_EQ(described(restored) == described(url), isWhole);
+    }
 }
 
 TEST_F(FUrlTest, CopiesAndComparisons)

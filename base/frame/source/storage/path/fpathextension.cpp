@@ -109,12 +109,14 @@ bool FPath::numberName(bool (*isTaken)(FPath& path, void* context), void* contex
     int number = cutNumber(base);
     if (base.isEmpty())
         base.assign(u"file");
+    FString numbered;
     for (number++; number <= kLastNumber; number++)
     {
-        printNumberedName(base, number, hasExtension ? &extension : nullptr, name);
+        printNumberedName(base, number, hasExtension ? &extension : nullptr, numbered);
+        setName(numbered.text16());
         if (!isTaken(*this, context))
             return true;
     }
-    name = former;
+    setName(former.text16());
     return false;
 }

@@ -184,7 +184,6 @@ void FUrl::setUrl(const char16* text)
     // What an earlier URL had must not go to another host.
     for (FString* part : {&host, &file, &user, &password})
         part->assign(u"");
-    port = 0;
     if (isFileProtocol())
         file = rest;
     else
@@ -335,6 +334,16 @@ void FUrl::setName(const char16* text)
     if (isFolderText)
         file.append(kUnixDelimiter);
     updatePath();
+}
+
+bool FUrl::updateExtension(bool replace)
+{
+    if (!FPath::updateExtension(replace))
+        return false;
+    // So far only the path's part has it.
+    const FString extended(name);
+    setName(extended.text16());
+    return true;
 }
 
 bool FUrl::descend(const char16* childName, int childType)

@@ -36,6 +36,8 @@ class FUrl : public FPath, public IUrl
 
     // Text
     void set(const char* newProtocol, const char* newHost, uint16 newPort, const char16* newFile);
+    /// Replaces all but what the text doesn't tell: without "://" the protocol stays, and without a port that
+    /// of a protocol that nobody handles.
     void setUrl(const char16* text) override;
     /// Without user and password. True when the result isn't empty.
     bool getUrl(FString& result) const;
@@ -63,6 +65,7 @@ class FUrl : public FPath, public IUrl
     bool fromString(const char16* text, int newType) override;
     bool getFullPath(FString& result) const override;
     void setName(const char16* text) override;
+    bool updateExtension(bool replace) override;
     bool descend(const char16* childName, int childType) override;
     bool ascend() override;
     bool isRootDir() const override;
