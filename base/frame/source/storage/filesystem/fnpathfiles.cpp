@@ -49,12 +49,6 @@ ConstString standardFolder(int which)
         return {};
     }
 }
-
-void endInDelimiter(FString& path)
-{
-    if (!path.testChar16(path.length() - 1, PATH_DELIMITER))
-        path.append(PATH_DELIMITER);
-}
 } // namespace
 
 bool FPath::makeUnique(FFileSystem& fileSystem)
@@ -153,8 +147,7 @@ bool FNPath::getStandardFolder(int which, const char16* subFolder, bool create)
 // The folder part becomes `folder` in any case, so that the path names the place where it would be.
 bool FNPath::enterFolder(const FString& folder, bool create)
 {
-    path = folder;
-    endInDelimiter(path);
+    setPathName(folder.text16());
     FNPath place(folder.text16(), kFolder);
     if (!gFileSystem)
         return false;

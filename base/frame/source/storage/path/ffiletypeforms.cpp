@@ -1,34 +1,20 @@
 #include "storage/attribute/farchive.h"
 #include "storage/attribute/fattributes.h"
+#include "storage/attribute/optionaltext.h"
 #include "storage/stream/ffiletype.h"
 #include "storage/stream/fstream.h"
 
 // The file forms of file types.
 
-namespace
-{
-void setUnlessEmpty(FAttributes& attributes, const char* key, const FString& text)
-{
-    if (!text.isEmpty())
-        attributes.set(key, text);
-}
-
-void getOrEmpty(const FAttributes& attributes, const char* key, FString& text)
-{
-    if (!attributes.get(key, text))
-        text.assign(u"");
-}
-} // namespace
-
 bool FFileType::storeAttributes(FAttributes& attributes) const
 {
     if (macType != 0)
         attributes.set("MacType", macType);
-    setUnlessEmpty(attributes, "DosType", dosType);
-    setUnlessEmpty(attributes, "UnixType", unixType);
-    setUnlessEmpty(attributes, "MimeType", mimeType);
-    setUnlessEmpty(attributes, "UTI", uti);
-    setUnlessEmpty(attributes, "Name", name);
+    OptionalText::store(attributes, "DosType", dosType);
+    OptionalText::store(attributes, "UnixType", unixType);
+    OptionalText::store(attributes, "MimeType", mimeType);
+    OptionalText::store(attributes, "UTI", uti);
+    OptionalText::store(attributes, "Name", name);
     return true;
 }
 
@@ -36,11 +22,11 @@ bool FFileType::restoreAttributes(FAttributes& attributes)
 {
     if (!attributes.get("MacType", macType))
         macType = 0;
-    getOrEmpty(attributes, "DosType", dosType);
-    getOrEmpty(attributes, "UnixType", unixType);
-    getOrEmpty(attributes, "MimeType", mimeType);
-    getOrEmpty(attributes, "UTI", uti);
-    getOrEmpty(attributes, "Name", name);
+    OptionalText::restore(attributes, "DosType", dosType);
+    OptionalText::restore(attributes, "UnixType", unixType);
+    OptionalText::restore(attributes, "MimeType", mimeType);
+    OptionalText::restore(attributes, "UTI", uti);
+    OptionalText::restore(attributes, "Name", name);
     return true;
 }
 

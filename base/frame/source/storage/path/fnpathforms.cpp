@@ -1,5 +1,6 @@
 #include "storage/attribute/farchive.h"
 #include "storage/attribute/fattributes.h"
+#include "storage/attribute/optionaltext.h"
 #include "storage/path/fnpath.h"
 #include "storage/stream/fstream.h"
 
@@ -14,27 +15,23 @@ enum Layout : int32
     kUnixLayout = 2
 };
 
-void makeNative(FString& path, int32 layout)
+// A folder part as it was stored becomes one of this platform, fit to have `name` behind it.
+void makeNative(FString& path, int32 layout, const FString& name)
 {
+    path.toWideString();
     const char16 stored = layout == kUnixLayout ? kUnixDelimiter : kWindowsDelimiter;
     const char16 set[] = {stored, 0};
     if (stored != PATH_DELIMITER)
         path.replaceChars16(set, PATH_DELIMITER);
-}
-
-void endInDelimiter(FString& path)
-{
-    if (!path.isEmpty() && !path.testChar16(path.length() - 1, PATH_DELIMITER))
+    if (!name.isEmpty() && !path.isEmpty() && !path.testChar16(path.length() - 1, PATH_DELIMITER))
         path.append(PATH_DELIMITER);
 }
 } // namespace
 
 bool FNPath::storeAttributes(FAttributes& attributes) const
 {
-    if (!name.isEmpty())
-        attributes.set("Name", name);
-    if (!path.isEmpty())
-        attributes.set("Path", path);
+    OptionalText::store(attributes, "Name", name);
+    OptionalText::store(attributes, "Path", path);
     if (type != kFile)
         attributes.set("Type", type);
     if (storeAttrFileType && !isFolder() && fileType.isValid())
@@ -45,10 +42,8 @@ bool FNPath::storeAttributes(FAttributes& attributes) const
 
 bool FNPath::restoreAttributes(FAttributes& attributes)
 {
-    if (!attributes.get("Name", name))
-        name.assign(u"");
-    if (!attributes.get("Path", path))
-        path.assign(u"");
+    OptionalText::restore(attributes, "Name", name);
+    OptionalText::restore(attributes, "Path", path);
     if (!attributes.get("Type", type))
         type = kFile;
     fileType.reset();
@@ -56,10 +51,7 @@ bool FNPath::restoreAttributes(FAttributes& attributes)
         attributes.getMember("FileType", fileType);
     int32 layout = kWindowsLayout;
     attributes.get("PathType", layout);
-    path.toWideString();
-    makeNative(path, layout);
-    if (!name.isEmpty())
-        endInDelimiter(path);
+    makeNative(path, layout, name);
     platformState = -1;
     return true;
 }
@@ -81,10 +73,7 @@ bool FNPath::internalize(FArchive& archive)
         return false;
     if (!stream.readInt16(type) || !path.internalize(archive))
         return false;
-    path.toWideString();
-    makeNative(path, layout);
-    if (!name.isEmpty())
-        endInDelimiter(path);
+    makeNative(path, layout, name);
     platformState = -1;
     return true;
 }

@@ -1,46 +1,32 @@
 #include "storage/attribute/farchive.h"
 #include "storage/attribute/fattributes.h"
+#include "storage/attribute/optionaltext.h"
 #include "storage/stream/fstream.h"
 #include "storage/url/furl.h"
 
 // The file forms of URLs.
-
-namespace
-{
-void setUnlessEmpty(FAttributes& attributes, const char* key, const FString& text)
-{
-    if (!text.isEmpty())
-        attributes.set(key, text);
-}
-
-void getOrEmpty(const FAttributes& attributes, const char* key, FString& text)
-{
-    if (!attributes.get(key, text))
-        text.assign(u"");
-}
-} // namespace
 
 bool FUrl::storeAttributes(FAttributes& attributes) const
 {
     attributes.set("Protocol", protocol);
     attributes.set("Host", host);
     attributes.set("Port", port);
-    setUnlessEmpty(attributes, "File", file);
-    setUnlessEmpty(attributes, "User", user);
-    setUnlessEmpty(attributes, "Password", password);
+    OptionalText::store(attributes, "File", file);
+    OptionalText::store(attributes, "User", user);
+    OptionalText::store(attributes, "Password", password);
     return true;
 }
 
 bool FUrl::restoreAttributes(FAttributes& attributes)
 {
     dropHandler();
-    getOrEmpty(attributes, "Protocol", protocol);
-    getOrEmpty(attributes, "Host", host);
+    OptionalText::restore(attributes, "Protocol", protocol);
+    OptionalText::restore(attributes, "Host", host);
     if (!attributes.get("Port", port))
         port = 0;
-    getOrEmpty(attributes, "File", file);
-    getOrEmpty(attributes, "User", user);
-    getOrEmpty(attributes, "Password", password);
+    OptionalText::restore(attributes, "File", file);
+    OptionalText::restore(attributes, "User", user);
+    OptionalText::restore(attributes, "Password", password);
     updatePath();
     return true;
 }
