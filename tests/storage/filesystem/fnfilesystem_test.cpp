@@ -338,11 +338,18 @@ TEST_F(FNFileSystemTest, ErrorsInNumbersAndWords)
         {EROFS, -2005, "This disk is read only."},
         {EPERM, -2006, "This operation is not allowed."},
         {EACCES, -2006, "This operation is not allowed."},
+        {-38, -2000, "A reading/writing error occurred. This disk is not working normaly."},
         {-36, -2000, "A reading/writing error occurred. This disk is not working normaly."},
         {-43, -2000, "The file/folder could not be found at this location."},
+        {-35, -2000, "The file/folder could not be found at this location."},
         {-34, -2000, "This disk is full."},
+        {-33, -2000, "This disk is full."},
         {-44, -2000, "This disk is read only."},
+        {-61, -2000, "This operation is not allowed."},
         {-54, -2000, "This operation is not allowed."},
+        {-46, -2000, "This operation is not allowed."},
+        {-45, -2000, "This operation is not allowed."},
+        {-60, -2000, "An unexpected error occurred. The system's description is: Unknown error -60"},
         {EBUSY, -2000, "An unexpected error occurred. The system's description is: Device or resource busy"},
     };
     for (const Row& row : rows)
@@ -429,8 +436,10 @@ TEST_F(FNFileSystemTest, RightsLinksAndVolumes)
     EXPECT_EQ(drives.total(), count);
     EXPECT_EQ(fullPathOf(*FCast(FNPath, drives.at(0))), "/");
     EXPECT_EQ(files->getDrives(drives, 64), 0);
-    EXPECT_EQ(utf8(files->getDriveTypeString(FNFileSystem::kFixedDrive)), "Harddisk");
-    EXPECT_EQ(files->getDriveTypeString(3), nullptr);
+    for (const auto& [type, words] : {std::pair(2, "Harddisk"), std::pair(4, "Removable Drive"),
+                                      std::pair(8, "Compact Disc"), std::pair(32, "Network Drive")})
+        EXPECT_EQ(utf8(files->getDriveTypeString(type)), words);
+    EXPECT_EQ(files->getDriveTypeString(64), nullptr);
     EXPECT_EQ(fullPathOf(*files->getRootDir(at("x"))), "/");
 }
 

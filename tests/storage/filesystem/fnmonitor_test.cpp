@@ -132,6 +132,16 @@ TEST_F(FNMonitorTest, ReportsWhatTheFileSystemDoes)
     EXPECT_EQ(listener.heard, own);
 }
 
+TEST_F(FNMonitorTest, EachNewFolderIsTold)
+{
+    EXPECT_TRUE(monitor->start());
+    files->createDir(at("a/b/c", FPath::kFolder));
+    files->createDir(at("a/b/c", FPath::kFolder));
+    EXPECT_TRUE(monitor->registerPath(&listener, at("", FPath::kFolder)));
+    messenger->deliverMessages();
+    EXPECT_EQ(listener.heard, (Changes{"1 " + root, "1 " + root + "/a", "1 " + root + "/a/b"}));
+}
+
 TEST_F(FNMonitorTest, ExcludedPathsAreNotTold)
 {
     EXPECT_TRUE(monitor->start());

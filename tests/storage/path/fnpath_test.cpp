@@ -142,8 +142,19 @@ TEST(FNPath, FindsTheWayFromOneFolderToAnother)
         EXPECT_TRUE(relative.makeAbsolute(&base));
         EXPECT_EQ(fullPathOf(relative), fullPathOf(absolute)) << "and back";
     }
-    FNPath path(u"/a/b", FPath::kFile);
-    const FNPath base(u"/a", FPath::kFolder);
+    FNPath path(u"/a/b", FPath::kLink);
+    const FNPath base(u"/a", FPath::kFolder), elsewhere(u"x/y", FPath::kFolder);
+    FNPath way(u"z.abc", FPath::kFile);
+    path.setFileType(FFileType("text/x", nullptr, nullptr, 0, "X"));
+    EXPECT_TRUE(way.assignRelative(&path, &elsewhere));
+    EXPECT_EQ(partsOf(way), "/a/|b") << "nothing in common";
+    for (const FNPath* from : {&base, static_cast<const FNPath*>(&path)})
+    {
+        way = FNPath(u"z.abc", FPath::kFile);
+        EXPECT_TRUE(way.assignRelative(&path, from));
+        EXPECT_TRUE(way.isLink());
+        EXPECT_EQ(utf8(way.getKnownFileType().getName()), "X");
+    }
     EXPECT_FALSE(path.assignRelative(nullptr, &base));
     EXPECT_FALSE(path.assignRelative(&path, nullptr));
     EXPECT_TRUE(path.makeRelative(&base));
@@ -160,12 +171,20 @@ TEST(FNPath, MakesRelativePathsAbsolute)
 
     const FNPath absolute(u"/q", FPath::kFile);
     EXPECT_EQ(absolute.createAbsolutePath(&base), nullptr);
-    for (const auto& [text, result] : {std::pair(u".", "/a/x"), std::pair(u"..", "/a"),
-                                       std::pair(u"../..", "/"), std::pair(u"../../../../b", "/b")})
+    for (const auto& [text, result] :
+         {std::pair(u".", "/a/x"), std::pair(u"..", "/a"), std::pair(u"../..", "/"),
+          std::pair(u"../../../../b", "/b"), std::pair(u"y/.", "/a/x"), std::pair(u"y/..", "/a"),
+          std::pair(u"y/z/w", "/a/x/y/z/w")})
     {
         const IPtr<FNPath> place = adopt(FNPath(text, FPath::kFile).createAbsolutePath(&base));
         EXPECT_EQ(fullPathOf(*place), result) << utf8(text);
     }
+    relative.setFileType(FFileType(nullptr, "abc", nullptr, 0, "Alphabet"));
+    relative.setPathType(FPath::kLink);
+    EXPECT_TRUE(relative.makeAbsolute(&base));
+    EXPECT_TRUE(relative.isLink());
+    EXPECT_EQ(utf8(relative.getKnownFileType().getName()), "Alphabet");
+    EXPECT_FALSE(relative.makeAbsolute(&base)) << "it is by now";
 }
 
 TEST(FNPath, WritesItselfAsAUrl)
@@ -199,6 +218,13 @@ TEST_F(FNPathStorage, AttributesHoldWhatIsSet)
     EXPECT_TRUE(attributes.get("PathType", layout));
     EXPECT_EQ(layout, 2);
 
+    FAttributes rootOnly;
+    FNPath(u"/", FPath::kFolder).storeAttributes(rootOnly);
+    EXPECT_FALSE(rootOnly.containsAttribute("Name"));
+    FAttributes nameOnly;
+    FNPath(u"a", FPath::kFile).storeAttributes(nameOnly);
+    EXPECT_FALSE(nameOnly.containsAttribute("Path") || nameOnly.containsAttribute("Type"));
+
     FNPath restored(u"/other/x", FPath::kFile);
     EXPECT_TRUE(restored.restoreAttributes(attributes));
     EXPECT_EQ(partsOf(restored), "/a/|b");
@@ -222,6 +248,27 @@ TEST_F(FNPathStorage, OlderLayoutsHadTheOtherDelimiter)
         FNPath path;
         path.restoreAttributes(attributes);
         EXPECT_EQ(partsOf(path), "C:/a/|b");
+    }
+}
+
+TEST_F(FNPathStorage, ArchivesTellTheirLayout)
+{
+    for (const auto& [layout, path, parts] :
+         {std::tuple(1, u"C:\\a", "C:/a/|b"), std::tuple(2, u"x\\y/", "x\\y/|b"), std::tuple(3, u"/", "")})
+    {
+        const IPtr<FMemoryStream> stream = adopt(new FMemoryStream);
+        FNewArchive writing(stream, true);
+        EXPECT_TRUE(FString(u"b").externalize(writing) && FFileType().externalize(writing) &&
+                    stream->writeInt32(layout) && stream->writeInt16(FPath::kFolder) &&
+                    FString(path).externalize(writing));
+        stream->rewind();
+        FNewArchive reading(stream, false);
+        FNPath restored;
+        ASSERT_EQ(restored.internalize(reading), layout < 3) << layout;
+        if (layout == 3)
+            continue;
+        EXPECT_EQ(partsOf(restored), parts);
+        EXPECT_TRUE(restored.isFolder());
     }
 }
 
