@@ -255,6 +255,15 @@ std::string Job::runWithoutDisk(const Arguments& arguments)
     return startWith(std::move(command)).finish();
 }
 
+void Job::runUnheard(const Arguments& arguments)
+{
+    // The pipe's reader is gone before the program begins.
+    Arguments command = {"bash", "-c", "exec 4> >(exec true); wait $!; exec \"$0\" \"$@\" >&4 2>&4",
+                         program()};
+    command.insert(command.end(), arguments.begin(), arguments.end());
+    startWith(std::move(command)).finish();
+}
+
 Job::Run Job::startWith(Arguments command)
 {
     Process::Setup setup;

@@ -65,6 +65,8 @@ protected:
     std::string run(const Arguments& arguments) { return start(arguments).finish(); }
     /// A start to its end that can make files but not write a single byte to them. Gives all that it printed.
     std::string runWithoutDisk(const Arguments& arguments);
+    /// A start to its end that nobody listens to.
+    void runUnheard(const Arguments& arguments);
     /// Sets a variable of the environment of all further starts.
     void setVariable(const std::string& name, const std::string& value)
     {

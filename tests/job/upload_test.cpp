@@ -207,6 +207,12 @@ TEST_F(Upload, TakesADescriptionByAPathRelativeToWhereItIsStarted)
     EXPECT_EQ(received("/tracks").size(), 1u);
 }
 
+TEST_F(Upload, WorksWhereNobodyReadsWhatItPrints)
+{
+    runUnheard({writeDescription(minimal())});
+    EXPECT_EQ(received("/tracks").size(), 1u);
+}
+
 TEST_F(Upload, WorksWithoutASessionBus)
 {
     setVariable("DBUS_SESSION_BUS_ADDRESS", "");
