@@ -27,6 +27,7 @@ namespace
 constexpr const char* kLanguages[] = {"de", "es", "fr", "it", "jp", "zh", "us"};
 
 constexpr const char16* kService = u"soundcloud";
+
 const char* findLanguage(const FString& code)
 {
     auto found = std::find_if(std::begin(kLanguages), std::end(kLanguages),
@@ -136,7 +137,7 @@ void PUploadManagerApplication::scanConfiguration(Xml::Element& element)
                             if (isElementNamed(child, u"RequireLogin"))
                                 requireLogin = isTrue;
                             else if (isElementNamed(child, u"GuiMode"))
-                                guiMode = isTrue;
+                                setGuiMode(isTrue);
                         });
 }
 

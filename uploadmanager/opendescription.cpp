@@ -1,11 +1,8 @@
 #include "application/udesktop.h"
-#include "containers/sequence/cmiterator.h"
 #include "foundation/object/iptr.h"
 #include "storage/archive/fxmlarchive.h"
 #include "storage/attribute/fattributes.h"
 #include "storage/filesystem/fnfilesystem.h"
-#include "storage/stream/fopenflags.h"
-#include "storage/stream/fstream.h"
 #include "storage/xml/xmldocument.h"
 #include "storage/xml/xmlelement.h"
 #include "uploadmanager/descriptionform.h"
@@ -88,8 +85,8 @@ bool PUploadManagerApplication::openDescription(FPath* path)
         refuseOtherProduct();
         return false;
     }
-    readTracks(root, *configuration);
-    if (!hasWaitingRequests())
+    // A thread that is under way may have taken the tracks from the queue already.
+    if (readTracks(root, *configuration) == 0 && !hasWaitingRequests())
     {
         fatalError(kFatalNoTrack);
         return true;
@@ -133,19 +130,25 @@ void PUploadManagerApplication::refuseOtherProduct()
     setModalAlertActive(false);
 }
 
-void PUploadManagerApplication::readTracks(Xml::Element& root, UploadRequest& configuration)
+// Gives how many tracks there were to upload.
+int PUploadManagerApplication::readTracks(Xml::Element& root, UploadRequest& configuration)
 {
+    int count = 0;
     forEachChildElement(root,
                         [&](Xml::Element& element)
                         {
                             if (!isElementNamed(element, u"Track"))
                                 return;
                             IPtr<UploadRequest> request = adopt(scanUploadRequest(&element, configuration));
-                            if (request)
-                                addRequest(request);
-                            else
+                            if (!request)
+                            {
                                 fatalError(kFatalTrack);
+                                return;
+                            }
+                            addRequest(request);
+                            count++;
                         });
+    return count;
 }
 
 // The redirect of the login starts the program anew and finds the description by the cache file.

@@ -51,7 +51,7 @@ class PUploadManagerApplication : public UApplication
     void requestFailed(UploadRequest* request);
     /// Sees to it that the thread works on the queue; null starts it again over the failed requests.
     void startUpload(VlmrApplication* application);
-    bool checkInitializeCurl(int fatalCode);
+    bool checkInitializeCurl();
 
     // Reporting. Thread-safe.
 
@@ -70,7 +70,7 @@ class PUploadManagerApplication : public UApplication
     void setModalAlertActive(bool active);
     /// Whether the process is going down, so that a running transfer must abort.
     bool isEnding() const { return ending; }
-    bool isGuiMode() const { return guiMode; }
+    bool isGuiMode() const;
 
     // The description.
 
@@ -111,8 +111,10 @@ private:
 
     int onIdle(FMessage* message);
     bool isWaitingForFile();
+    bool endRunIfDue();
     bool showFatalError();
     int onUploadProgress(FMessage* message);
+    bool createProgress();
     bool openProgress();
     bool showProgress(FMessage& message);
     int onShowAreYouSure();
@@ -120,9 +122,11 @@ private:
     bool askRetry();
     bool retryFailedRequests();
     bool restartForWaitingRequests();
+    void forgetFormerEnd();
     void endProgress();
     bool hasFatalError();
     void setCancelRequested(bool requested);
+    void setGuiMode(bool state);
     void addWarnings(CmArray& errors);
 
     void takeDescription(FPath* path);
@@ -131,7 +135,7 @@ private:
     bool hasWaitingRequests();
     bool isOtherProductActive(VlmrApplication* application) const;
     void refuseOtherProduct();
-    void readTracks(Xml::Element& root, UploadRequest& configuration);
+    int readTracks(Xml::Element& root, UploadRequest& configuration);
     void waitForLogin(FPath* path);
 
     VlmrApplication* findProduct(const ConstString& name) const;

@@ -64,7 +64,7 @@ bool PUploadManagerApplication::hasFatalError()
     return !fatalErrorText.isEmpty();
 }
 
-// Moves the texts of a store to the warning list; the store keeps them.
+// Copies the texts of a store to the warning list. They are shared by reference meanwhile, as the list is not locked.
 void PUploadManagerApplication::addWarnings(CmArray& errors)
 {
     CmArray texts(0, 10);

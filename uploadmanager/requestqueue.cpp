@@ -1,3 +1,6 @@
+#include "application/ucontroller.h"
+#include "foundation/message/fmessage.h"
+#include "foundation/message/fmessenger.h"
 #include "foundation/thread/flockscope.h"
 #include "uploadmanager/puploadmanagerapplication.h"
 #include "uploadmanager/uploadrequest.h"
@@ -65,7 +68,7 @@ void PUploadManagerApplication::startUpload(VlmrApplication* application)
 {
     if (!application && (!uploadThread || !uploadThread->getApplication()))
         fatalError(kFatalRetryWithoutThread);
-    if (!checkInitializeCurl(kFatalCurlGlobal))
+    if (!checkInitializeCurl())
         return;
 
     if (!uploadThread)
@@ -79,15 +82,27 @@ void PUploadManagerApplication::startUpload(VlmrApplication* application)
         return;
     if (!application)
         uploadThread->terminate();
-    uploadThread->run();
+    forgetFormerEnd();
+    if (uploadThread->run() != 0)
+        fatalError(strNoMemory.text());
 }
 
-bool PUploadManagerApplication::checkInitializeCurl(int fatalCode)
+// What a former run said at its end is taken back where it was not heard yet: "upload done" would end the run that
+// begins now, and so would the quit message that followed from it.
+void PUploadManagerApplication::forgetFormerEnd()
+{
+    FMessage done("upload done");
+    gMessenger->killMessages(this, &done);
+    FMessage quitting("Quit");
+    gMessenger->killMessages(gController, &quitting);
+}
+
+bool PUploadManagerApplication::checkInitializeCurl()
 {
     if (curlInitialized)
         return true;
     curlInitialized = curl_global_init(CURL_GLOBAL_ALL) == CURLE_OK;
     if (!curlInitialized)
-        fatalError(fatalCode);
+        fatalError(kFatalCurlGlobal);
     return curlInitialized;
 }

@@ -11,7 +11,9 @@
 #include "views/dialog/dialogstrings.h"
 #include "views/dialog/ualert.h"
 
+#include <algorithm>
 #include <atomic>
+#include <iterator>
 
 // How the program follows its run: the idle pulse and the messages of the upload thread, all on the main thread.
 
@@ -28,7 +30,7 @@ constexpr int kProgressMaximum = 100;
 constexpr int kAnswerYes = 1;
 constexpr int kAnswerNo = 2;
 
-// The dialog's cancel button writes the flag through a plain pointer, and the upload thread reads it.
+// Flags that the upload thread reads; the dialog's cancel button writes one of them through a plain pointer.
 bool loadFlag(const bool& flag)
 {
     return std::atomic_ref<bool>(const_cast<bool&>(flag)).load();
@@ -75,6 +77,16 @@ void PUploadManagerApplication::setModalAlertActive(bool active)
     storeFlag(modalAlertActive, active);
 }
 
+bool PUploadManagerApplication::isGuiMode() const
+{
+    return loadFlag(guiMode);
+}
+
+void PUploadManagerApplication::setGuiMode(bool state)
+{
+    storeFlag(guiMode, state);
+}
+
 bool PUploadManagerApplication::isModal()
 {
     return isModalAlertActive() || UApplication::isModal();
@@ -104,18 +116,20 @@ int PUploadManagerApplication::onIdle(FMessage* message)
         translationEnabled = true;
         gTranslator->initialize(false);
     }
+    return endRunIfDue() ? kHandled : UApplication::notify(message);
+}
+
+bool PUploadManagerApplication::endRunIfDue()
+{
     // Held while the alert is up, so that the upload thread adds no further error behind the one that is shown.
     FLockScope guard(errorLock);
     if (!fileReceived && fatalErrorText.isEmpty())
         fatalErrorText.assign(stringCannotStartDirectly.text());
     if (showFatalError())
-        return kHandled;
+        return true;
     if (quitAtIdle)
-    {
         quit();
-        return kHandled;
-    }
-    return UApplication::notify(message);
+    return quitAtIdle;
 }
 
 bool PUploadManagerApplication::isWaitingForFile()
@@ -143,28 +157,37 @@ int PUploadManagerApplication::onUploadProgress(FMessage* message)
 {
     if (quitAtIdle || isCancelRequested() || hasFatalError())
         return kHandled;
-    if (!progress && !openProgress())
+    bool isShown = true;
+    if (!progress)
     {
-        fatalError(kFatalProgressDialog);
-        return kFailed;
+        if (!createProgress())
+        {
+            fatalError(kFatalProgressDialog);
+            return kFailed;
+        }
+        isShown = openProgress();
     }
     DeliveryPause pause;
-    return showProgress(*message) ? kHandled : kFailed;
+    return showProgress(*message) && isShown ? kHandled : kFailed;
 }
 
-bool PUploadManagerApplication::openProgress()
+bool PUploadManagerApplication::createProgress()
 {
     ClassFactory* factory = ClassFactory::instance(false);
     FUnknown* object = factory ? factory->createObjectByID(IProgress::iid) : nullptr;
     progress = askInterface<IProgress>(object);
     if (object)
         object->release();
-    if (!progress)
-        return false;
-    progress->initialize(kProgressModePlain, stringUploadingToSoundCloud.text(), &cancelRequested);
-    progress->setMaxValue(kProgressMaximum);
-    progress->startProcessing();
-    return true;
+    return progress != nullptr;
+}
+
+bool PUploadManagerApplication::openProgress()
+{
+    const int32 results[] = {
+        progress->initialize(kProgressModePlain, stringUploadingToSoundCloud.text(), &cancelRequested),
+        progress->setMaxValue(kProgressMaximum), progress->startProcessing()};
+    return std::all_of(std::begin(results), std::end(results),
+                       [](int32 result) { return result == kResultOk; });
 }
 
 bool PUploadManagerApplication::showProgress(FMessage& message)
@@ -204,6 +227,9 @@ int PUploadManagerApplication::onUploadDone()
 {
     if (quitAtIdle || hasFatalError())
         return kHandled;
+    // The thread has said its last word; only its return is outstanding.
+    if (uploadThread)
+        uploadThread->waitDead(-1);
     if (restartForWaitingRequests())
         return kHandled;
     endProgress();
@@ -220,8 +246,6 @@ bool PUploadManagerApplication::restartForWaitingRequests()
 {
     if (!uploadThread || isCancelRequested() || !hasWaitingRequests())
         return false;
-    // The thread has said its last word; only its return is outstanding.
-    uploadThread->waitDead(-1);
     startUpload(uploadThread->getApplication());
     return true;
 }

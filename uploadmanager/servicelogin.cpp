@@ -74,7 +74,7 @@ bool contains(const ConstString& text, const ConstString& word)
 
 bool PUploadManagerApplication::isValidAccessToken(FString& token)
 {
-    if (token.isEmpty() || !isUsableToken(token) || !checkInitializeCurl(kFatalCurlGlobal))
+    if (!isUsableToken(token) || !checkInitializeCurl())
         return false;
     CURL* curl = curl_easy_init();
     if (!curl)
@@ -151,7 +151,7 @@ bool PUploadManagerApplication::checkScLoginData(FPath* url, CmDictionary& dicti
         FString encoded(*token);
         if (!FBase64::encode(encoded))
             return false;
-        product->accessToken = encoded;
+        ClearToken::replace(product->accessToken, encoded);
         storeToken(product->name, encoded);
         return true;
     }

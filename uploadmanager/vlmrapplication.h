@@ -5,7 +5,7 @@
 
 /// One host product: its name, its identity at the service, and the user's token for it.
 ///
-/// Main thread; the upload thread reads a product that is being served, and decodes its token for the moment of use.
+/// Main thread; the upload thread knows the product that is being served, and both reach its token by ClearToken only.
 class VlmrApplication : public CmObject
 {
     DECLARE_COPYABLE(VlmrApplication, CmObject)

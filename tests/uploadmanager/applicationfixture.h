@@ -5,6 +5,7 @@
 #include "foundation/text/cmstring.h"
 #include "uploadmanager/puploadmanagerapplication.h"
 #include "uploadmanager/uploadrequest.h"
+#include "uploadmanager/uploadthread.h"
 
 #include <cstdlib>
 #include <filesystem>
@@ -45,6 +46,8 @@ struct ApplicationProbe
     static int finished(PUploadManagerApplication& app) { return app.finishedRequests.total(); }
     static int failed(PUploadManagerApplication& app) { return app.failedRequests.total(); }
     static void cancel(PUploadManagerApplication& app) { app.setCancelRequested(true); }
+    static bool isCancelled(PUploadManagerApplication& app) { return app.isCancelRequested(); }
+    static void waitForThread(PUploadManagerApplication& app) { app.uploadThread->waitDead(-1); }
     static bool quitsAtIdle(PUploadManagerApplication& app) { return app.quitAtIdle; }
     static VlmrApplication* product(PUploadManagerApplication& app, const char* name)
     {
