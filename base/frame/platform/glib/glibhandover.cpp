@@ -64,6 +64,11 @@ bool GlibHandOver::handOver(int argc, char** argv)
 
 void GlibHandOver::stop()
 {
+    // A process whose answer got lost would work on its arguments again.
+    const bool isRegistered = application && g_application_get_is_registered(application);
+    GDBusConnection* bus = isRegistered ? g_application_get_dbus_connection(application) : nullptr;
+    if (bus)
+        g_dbus_connection_flush_sync(bus, nullptr, nullptr);
     g_clear_object(&application);
 }
 
