@@ -85,7 +85,7 @@ TEST_F(Stripper, ObjectsThatWereMadeOfPlaceholdersAreStrippedAnew)
     {
         auto second = adopt(new StoredNode(2));
         tree.setObject("a", adopt(new StoredNode(1, second)));
-        tree.setObject("b", second);
+        tree.entry("b").setUnknown(static_cast<FUnknown*>(second.get()), FAttributeValue::kBorrowed);
         tree.queueObject("q", second);
     }
     tree.stripObjects();
@@ -131,4 +131,23 @@ TEST_F(Stripper, WhatFailsToBeMadeIsNotTriedAgain)
     stored->set("Number", 1);
     EXPECT_EQ(tree.getObject("failing", "StoredNode"), nullptr);
     EXPECT_EQ(stored->getRefCount(), 1u);
+}
+
+TEST(FXmlReference, ThoseThatDoNotCountAreEmptyWhenTheirTargetGoes)
+{
+    auto target = adopt(new FXmlInstance(1, "StoredNode", nullptr));
+    std::vector<IPtr<FXmlReference>> references;
+    for (int i = 0; i < 5; i++)
+    {
+        references.push_back(adopt(new FXmlReference(1)));
+        references.back()->setTarget(target, false);
+    }
+    EXPECT_EQ(target->getRefCount(), 1u);
+    references.erase(references.begin() + 1);
+    references.pop_back();
+    references.front()->setTarget(nullptr, false);
+    EXPECT_EQ(references.back()->getTarget(), target.get());
+    target = nullptr;
+    for (const auto& reference : references)
+        EXPECT_EQ(reference->getTarget(), nullptr);
 }

@@ -58,6 +58,8 @@ void FCmObjectStripper::stripAttributes(FAttributes& attributes, CmHashTable& se
 bool FCmObjectStripper::stripValue(FAttributeValue& value, CmHashTable& seen)
 {
     CmObject* object = value.getObj();
+    if (!object)
+        object = toCmObject(value.getUnknown());
     if (auto* tree = FCast(FAttributes, object))
         stripAttributes(*tree, seen);
     else if (auto* trees = FCast(FSubList, object))

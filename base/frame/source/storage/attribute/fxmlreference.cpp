@@ -2,8 +2,6 @@
 
 #include "storage/attribute/fxmlinstance.h"
 
-#include <algorithm>
-
 DEFINE_CLASS(FXmlReference, FXmlObject)
 
 FXmlReference::FXmlReference(const FXmlReference& other) : FXmlObject(other)
@@ -29,8 +27,10 @@ void FXmlReference::setTarget(FXmlInstance* instance, bool counted)
     drop();
     target = instance;
     isCounted = counted;
-    if (instance && !counted)
-        instance->uncounted.push_back(this);
+    if (!instance || counted)
+        return;
+    place = instance->uncounted.size();
+    instance->uncounted.push_back(this);
 }
 
 void FXmlReference::drop()
@@ -39,9 +39,14 @@ void FXmlReference::drop()
     target = nullptr;
     if (!former)
         return;
-    auto& uncounted = former->getInstance()->uncounted;
     if (isCounted)
+    {
         former->release();
-    else
-        uncounted.erase(std::find(uncounted.begin(), uncounted.end(), this));
+        return;
+    }
+    // The last one takes this one's place: a parent may have very many children that refer to it.
+    auto& uncounted = former->getInstance()->uncounted;
+    uncounted[place] = uncounted.back();
+    uncounted[place]->place = place;
+    uncounted.pop_back();
 }

@@ -2,6 +2,8 @@
 
 #include "storage/attribute/fxmlobject.h"
 
+#include <cstddef>
+
 /// A place where the file refers to an object by number.
 ///
 /// The target is counted; not so where that would close a circle, for then nobody could ever release the objects of
@@ -29,4 +31,6 @@ private:
 
     FXmlObject* target = nullptr;
     bool isCounted = false;
+    /// Where the target notes this one, if it isn't counted.
+    size_t place = 0;
 };
