@@ -62,14 +62,75 @@ TEST(FXmlParser, ReportsErrorsInWords)
     EXPECT_STREQ(parser.getCurrentStartTag(), "a");
 }
 
+TEST(FXmlParser, CountsLinesAlikeInAllItReads)
+{
+    const struct
+    {
+        const char* text;
+        int line;
+    } cases[] = {
+        {"<a>\r\n\n\r\n</a>", 4},
+        {"<a b=\r\n\r\n'1'/>", 3},
+        {"<a b='\r\n'\r\n/>", 3},
+        {"<a>x\r\ny\n\r</a>", 3},
+        {"<!-- \r\n\r\n --><a/>", 3},
+        {"<!DOCTYPE a [\r\n\r\n]><a/>", 3},
+        {"<!DOCTYPE a '\r\n\r\n'><a/>", 3},
+        {"<![CDATA[ \r\n\r\n ]]><a/>", 3},
+        {"<a>x\r<b>\n</a>", 3},
+    };
+    for (const auto& [text, line] : cases)
+        for (const bool buffered : {true, false})
+        {
+            TextStream stream(text);
+            RecordingParser parser(stream, buffered);
+            EXPECT_TRUE(parser.process(nullptr)) << text;
+            EXPECT_EQ(parser.getLine(), line) << text;
+        }
+    // The pair of line ends is cut by the limit of a piece.
+    TextStream stream("<a>" + std::string(2 * FXmlParser::kMaxToken - 1, 'x') + "\r\n</a>");
+    RecordingParser parser(stream);
+    EXPECT_TRUE(parser.process(nullptr));
+    EXPECT_EQ(parser.getLine(), 2);
+}
+
 TEST(FXmlParser, StopsWhereAHandlerRefuses)
 {
-    TextStream stream("<a><b/><c/></a>");
-    RecordingParser parser(stream);
-    parser.refusedTag = "b";
-    EXPECT_FALSE(parser.process(nullptr));
-    EXPECT_EQ(parser.getError(), FXmlParser::kErrorUnexpectedTag);
-    EXPECT_EQ(parser.record, "<a><b/>");
+    for (const std::string refused : {"b", "/b"})
+    {
+        TextStream stream("<a><b></b><c/></a>");
+        RecordingParser parser(stream);
+        parser.refusedTag = refused;
+        EXPECT_FALSE(parser.process(nullptr));
+        EXPECT_EQ(parser.getError(), FXmlParser::kErrorUnexpectedTag);
+        EXPECT_EQ(parser.record, refused == "b" ? "<a><b>" : "<a><b></b>");
+    }
+}
+
+TEST(FXmlParser, KeepsTheErrorOfARefusingHandler)
+{
+    struct Parser : RecordingParser
+    {
+        using RecordingParser::RecordingParser;
+        bool startTag(const char*, CmContainer&, bool, void*) override
+        {
+            error = wanted;
+            return false;
+        }
+        int32 wanted = 0;
+    };
+    const char* messages[] = {"Unexpected tag or invalid attributes!", "Xml data malformed!",
+                              "Unexpected tag or invalid attributes!", "Unexpected end of file!",
+                              "Not enough actual attributes in tag!",  "Unexpected Tag!"};
+    for (int32 code = 0; code <= FXmlParser::kErrorOtherTagExpected; code++)
+    {
+        TextStream stream("<a/>");
+        Parser parser(stream);
+        parser.wanted = code;
+        EXPECT_FALSE(parser.process(nullptr));
+        EXPECT_EQ(parser.getError(), code ? code : 2);
+        EXPECT_EQ(narrow(parser.errorMessage()), messages[code]);
+    }
 }
 
 TEST(FXmlParser, DecodesEntitiesInValues)

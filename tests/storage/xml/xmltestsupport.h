@@ -53,7 +53,7 @@ public:
     bool endTag(const char* name, void*) override
     {
         record += std::string("</") + name + ">";
-        return true;
+        return refusedTag != std::string("/") + name;
     }
     void gotData(void* bytes, unsigned int count, void*) override
     {

@@ -206,4 +206,6 @@ private:
     const uint32 blockSize;
     Buffer tokenBuffer;
     Buffer tagName;
+    /// The line end that was counted last, while the next byte may still belong to it.
+    char lastLineEnd = 0;
 };

@@ -111,23 +111,22 @@ FXmlParser::Run FXmlParser::copyUntil(TokenText& token, Predicate ends)
 
 void FXmlParser::skipSpace()
 {
-    while (hasByte() && isXmlSpace(frontByte()))
-        bufferPos++;
+    for (; hasByte() && isXmlSpace(frontByte()); bufferPos++)
+        countLines(buffer + bufferPos, 1);
 }
 
-// For line ends that are no tokens. Each pair of two different ones counts once.
+// For line ends that are no tokens. Each pair of two different ones counts once, also where it comes in two pieces.
 void FXmlParser::countLines(const char* text, size_t length)
 {
-    if (!memchr(text, '\n', length) && !memchr(text, '\r', length))
+    if (lastLineEnd == 0 && !memchr(text, '\n', length) && !memchr(text, '\r', length))
         return;
     for (size_t i = 0; i < length; i++)
     {
-        if (text[i] != '\n' && text[i] != '\r')
-            continue;
-        line++;
-        const char partner = text[i] == '\n' ? '\r' : '\n';
-        if (i + 1 < length && text[i + 1] == partner)
-            i++;
+        const bool isLineEnd = text[i] == '\n' || text[i] == '\r';
+        const bool isSecondHalf = isLineEnd && lastLineEnd != 0 && lastLineEnd != text[i];
+        const bool isNew = isLineEnd && !isSecondHalf;
+        line += isNew ? 1 : 0;
+        lastLineEnd = isNew ? text[i] : '\0';
     }
 }
 
@@ -136,6 +135,7 @@ void FXmlParser::countLines(const char* text, size_t length)
 FXmlParser::Token FXmlParser::getNextToken(char* token, long long* size, bool insideTag)
 {
     settleLookAhead();
+    lastLineEnd = 0;
     TokenText text(token);
     const Token kind = readToken(text, insideTag);
     text.terminate();
