@@ -160,5 +160,9 @@ TEST(XmlWriter2, TellsThatTheStreamIsFull)
     FullStream stream;
     XmlWriter2 writer(&stream);
     EXPECT_EQ(writer.writeStartTag("abc", kOpenTag), 0);
+    writer.setSingleLine(true);
     EXPECT_NE(writer.writeStartTag("much too long", kOpenTag), 0);
+    EXPECT_NE(writer.writeEndTag("much too long", true), 0);
+    EXPECT_FALSE(writer.isSingleLine()) << "a failure doesn't stick";
+    EXPECT_EQ(writer.writeString8("1"), 0);
 }

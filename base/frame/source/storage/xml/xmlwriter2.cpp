@@ -90,11 +90,13 @@ int32 XmlWriter2::writeEndTag(const char* name, bool endSingleLine)
     line.put("</", 2);
     Xml::appendText(line, name);
     line.put('>');
+    const bool endsLine = singleLine && endSingleLine;
     const int32 result = writeLine(singleLine ? 0 : depth);
-    if (!singleLine || !endSingleLine || result != kResultOk)
+    if (!endsLine)
         return result;
     singleLine = false;
-    return newLine();
+    const int32 ended = newLine();
+    return result != kResultOk ? result : ended;
 }
 
 int32 XmlWriter2::writeString8(const char* text)
