@@ -135,6 +135,22 @@ TEST(FPlugXmlParser, PutsTheStreamBehindTheMainTag)
     EXPECT_EQ(stream.tell(), 8);
 }
 
+TEST(FPlugXmlParser, KeepsSpacesOnDemand)
+{
+    for (const bool keeps : {true, false})
+    {
+        TextStream stream("<a>  x</a>");
+        Definition definition;
+        FPlugXmlParser parser;
+        int calls = 0;
+        parser.initialize(&stream, &definition);
+        parser.keepSpaces(true);
+        parser.keepSpaces(keeps);
+        EXPECT_EQ(parser.process(&calls), kResultOk);
+        EXPECT_EQ(definition.record, keeps ? "<a>  x</a>" : "<a>x</a>");
+    }
+}
+
 TEST(FPlugXmlParser, IsFoundByItsInterfaces)
 {
     FPlugXmlParser parser;

@@ -81,6 +81,26 @@ TEST(FXmlParser2, TellsTheReasonOfAFailure)
     EXPECT_FALSE(parser.process(nullptr));
 }
 
+TEST(FXmlParser2, TakesAFailingStreamForOneThatEnds)
+{
+    struct BrokenStream : TextStream
+    {
+        using TextStream::TextStream;
+        using TextStream::read;
+        int32 read(void* bytes, int count, int* done) override
+        {
+            return --goodReads < 0 ? kStreamFailed : TextStream::read(bytes, count, done);
+        }
+        int goodReads = 1;
+    };
+    BrokenStream whole("<a/>"), torn("<a>" + std::string(100000, ' ') + "</a>");
+    FXmlParser2 parser;
+    EXPECT_TRUE(parser.process(&whole));
+    ASSERT_TRUE(parser.reset(nullptr));
+    EXPECT_FALSE(parser.process(&torn));
+    EXPECT_EQ(errorOf(parser), "Xml Error: no element found \r\nLine: 1");
+}
+
 TEST(FXmlParser2, CountsLinesFromZeroWhenStopped)
 {
     TextStream stream("<a>\n<b/>\n</a>");

@@ -3,6 +3,8 @@
 
 #include <gtest/gtest.h>
 
+#include <cstring>
+#include <iterator>
 #include <string>
 
 TEST(XmlEntities, TablesAgreeButForTheBytesOfLatinNames)
@@ -33,6 +35,22 @@ TEST(XmlEntities, KeepsThePlacesOfTheWindowsTable)
     EXPECT_EQ(byteOf("Atilde"), 0xC3);
     EXPECT_EQ(byteOf("Auml"), 0xC4);
     EXPECT_EQ(byteOf("divide"), 0xF7);
+}
+
+TEST(XmlEntities, NamesTheCharactersOfAsciiInBothTables)
+{
+    const char* names[] = {"quot",  "amp",    "lt",     "gt",    "bsol",  "apos",   "excl",
+                           "num",   "dollar", "percnt", "lpar",  "rpar",  "ast",    "plus",
+                           "comma", "hyphen", "period", "sol",   "colon", "semi",   "equals",
+                           "quest", "commat", "lsqb",   "rsqb",  "circ",  "horbar", "grave",
+                           "lcub",  "verbar", "rcub",   "tilde", "nl",    "cr"};
+    const std::string characters = "\"&<>\\'!#$%()*+,-./:;=?@[]^_`{|}~\n\r";
+    ASSERT_EQ(characters.size(), std::size(names));
+    for (size_t i = 0; i < characters.size(); i++)
+        for (const bool windowsTable : {true, false})
+            EXPECT_EQ(decodeXmlEntity(names[i], static_cast<int>(strlen(names[i])), windowsTable),
+                      characters[i])
+                << names[i];
 }
 
 TEST(XmlEntities, HasTheFiveNamesInBothWidths)
