@@ -74,6 +74,10 @@ TEST(UTranslationParser, ReadsTheNewFormat)
                   "<String><de>x</de></String><String Key='k'><de></de><fr>y</fr></String></StringTable>")),
               "k>fr:y;")
         << "without key or text there is nothing to take";
+    EXPECT_EQ(found(newFile("<StringTable><Other/><String Key='a'><de>x</de></String>"
+                            "<String Key='b'>y<de>z</de>y<fr>z</fr></String></StringTable>")),
+              "b>de:z;b>fr:z;")
+        << "a foreign element ends the table, and the end of a text begins it again";
 }
 
 TEST(UTranslationParser, StopsAtFaultsOfTheNewFormat)

@@ -14,6 +14,7 @@
 #include <filesystem>
 #include <fstream>
 #include <iterator>
+#include <memory>
 #include <string>
 
 namespace
@@ -159,6 +160,40 @@ TEST_F(TranslatorTest, CopiesAndTurnsBack)
     EXPECT_EQ(narrow(translator.untranslate(u"x")), "x");
 }
 
+TEST_F(TranslatorTest, LoadsAndForgetsBlocks)
+{
+    builtIn = kTexts;
+    translator.initialize("de", nullptr);
+    EXPECT_FALSE(translator.loadResource(nullptr, u"other.xml", nullptr));
+    EXPECT_TRUE(translator.loadResource(nullptr, u"translation.xml", "fr"));
+    EXPECT_EQ(narrow(translator.translate(u"Yes")), "Oui");
+    translator.removeTranslations(1);
+    EXPECT_EQ(translator.countTranslations(), 1) << "German isn't held";
+    translator.removeTranslations(2);
+    EXPECT_EQ(translator.countTranslations(), 0);
+    EXPECT_EQ(translator.countExtraTranslations(), 1);
+    translator.removeTranslations(0);
+    translator.removeTranslations(9);
+    EXPECT_EQ(translator.countExtraTranslations(), 0);
+    translator.initialize(true);
+    EXPECT_FALSE(translator.loadResource(nullptr, u"translation.xml", "fr"));
+}
+
+TEST_F(TranslatorTest, IsTheFirstOneBuilt)
+{
+    UTranslator other;
+    other.initialize("de", nullptr);
+    other.addTranslation(u"Yes", "de", u"Ja");
+    EXPECT_EQ(gTranslator, &translator);
+    const UTranslatedString string("Yes"), missing("No");
+    EXPECT_EQ(narrow(string.text()), "Yes") << "translated strings ask the first";
+    translator.initialize("de", nullptr);
+    translator.setEmptyIfMissing(true);
+    EXPECT_EQ(missing.text()[0], 0);
+    translator.setEmptyIfMissing(false);
+    EXPECT_EQ(missing.text()[0], 0) << "the empty text is kept too";
+}
+
 TEST_F(TranslatorTest, AnswersTranslatedStringsOnce)
 {
     builtIn = kTexts;
@@ -297,6 +332,16 @@ TEST_F(TranslatorTest, TellsLanguageDependents)
     EXPECT_EQ(LanguageDependents::instance().total(), 1);
     translator.initialize("de");
     EXPECT_EQ(first.changes, 1);
+
+    struct Leaving : ILanguageDependent
+    {
+        void languageChanged() override { other.reset(); }
+        std::unique_ptr<Dependent> other;
+    } leaving;
+    leaving.other = std::make_unique<Dependent>();
+    LanguageDependents::instance().languageChanged();
+    EXPECT_EQ(LanguageDependents::instance().total(), 2) << "one that went meanwhile is not told";
+    EXPECT_EQ(first.changes, 2);
 }
 
 TEST_F(TranslatorTest, RemembersThousandsOfTexts)

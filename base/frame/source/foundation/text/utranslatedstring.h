@@ -7,8 +7,8 @@
 /// A text for the user: the English literal, which is the key of its translation as well.
 ///
 /// The first `text` asks the translator, and its answer holds for the rest of the run: a text that is read before
-/// the translator is ready stays English. Made as a static object in the file that uses it. Any thread may read it:
-/// a race stores the same pointer twice.
+/// the translator is ready stays English. Made as a static object in the file that uses it. *Thread-safe*: a race
+/// stores the same pointer twice.
 class UTranslatedString
 {
 public:

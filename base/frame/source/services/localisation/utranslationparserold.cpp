@@ -236,7 +236,8 @@ bool UTranslationParserOld::readEndTag()
 
 bool UTranslationParserOld::readText()
 {
-    const int end = find("<") < 0 ? size : find("<");
+    const int found = find("<");
+    const int end = found < 0 ? size : found;
     const char* from = data + position;
     const int length = end - position;
     const bool isWanted = place == Place::kLanguage || place == Place::kTranslation;

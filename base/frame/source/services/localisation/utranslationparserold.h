@@ -9,8 +9,8 @@ class ITranslationReceiver;
 /// Reads the old format of translation files: 8-bit text in the default encoding, and an element `Translation` that
 /// names its language in an attribute.
 ///
-/// Tags that it doesn't know are passed over, whatever they hold; the known ones are expected in their places. *One
-/// thread at a time.*
+/// Tags that it doesn't know are passed over; the known ones are expected in their places, and text only in a language
+/// or a translation. *One thread at a time.*
 class UTranslationParserOld
 {
 public:
