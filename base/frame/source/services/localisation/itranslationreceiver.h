@@ -2,7 +2,7 @@
 
 #include "foundation/object/types.h"
 
-/// What a parser of a translation file hands its rows to.
+/// What a parser of a translation file hands its rows to. *One thread at a time.*
 class ITranslationReceiver
 {
 public:

@@ -2,7 +2,7 @@
 
 #include "foundation/object/funknown.h"
 
-/// Gives texts in the user's language.
+/// Gives texts in the user's language. *Thread-safe* while no texts are added.
 class ITranslator : public FUnknown
 {
 public:

@@ -2,7 +2,7 @@
 
 #include "foundation/object/types.h"
 
-/// A borrowed 16-bit text as a key: equal by its characters, never null.
+/// A borrowed 16-bit text as a key: equal by its characters, never null. *Immutable.*
 struct TransConstString
 {
     const char16* text = u"";
@@ -10,7 +10,7 @@ struct TransConstString
     bool operator==(const TransConstString& other) const;
 };
 
-/// A borrowed language code as a key: the first two letters count.
+/// A borrowed language code as a key: the first two letters count. *Immutable.*
 struct TransLanguageCode
 {
     const char* code = "";

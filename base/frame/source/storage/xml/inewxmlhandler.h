@@ -4,7 +4,8 @@
 
 class INewXmlParser;
 
-/// Hears what a newer parser finds. All text is UTF-8, entities decoded, and valid during the call only.
+/// Hears what a newer parser finds. All text is UTF-8, entities decoded, and valid during the call only. One thread at a
+/// time.
 class INewXmlHandler : public FUnknown
 {
 public:

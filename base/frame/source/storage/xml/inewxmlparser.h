@@ -6,7 +6,7 @@ class IBStream;
 class INewXmlHandler;
 class IStringResult;
 
-/// A parser that reads a document block by block and can rest between two of its handler's calls.
+/// A parser that reads a document block by block and can rest between two of its handler's calls. One thread at a time.
 class INewXmlParser : public FUnknown
 {
 public:

@@ -9,7 +9,8 @@ inline constexpr int32 kXmlAlreadyInitialized = 1;
 inline constexpr int32 kXmlInvalidStream = 2;
 inline constexpr int32 kXmlNotInitialized = 5;
 
-/// A plug-in's ear: hears what the parser reads. A false result ends the parsing with an error.
+/// A plug-in's ear: hears what the parser reads. A false result ends the parsing with an error. One
+/// thread at a time.
 class IXmlParserDef : public FUnknown
 {
 public:
@@ -23,7 +24,7 @@ public:
     DECLARE_INTERFACE_ID
 };
 
-/// The older parser as a plug-in sees it.
+/// The older parser as a plug-in sees it. One thread at a time.
 class IXmlParser : public FUnknown
 {
 public:
@@ -37,7 +38,7 @@ public:
     DECLARE_INTERFACE_ID
 };
 
-/// The further operations that came later.
+/// The further operations that came later. One thread at a time.
 class IXmlParser2 : public IXmlParser
 {
 public:

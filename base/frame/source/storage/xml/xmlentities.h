@@ -2,7 +2,7 @@
 
 #include "foundation/object/types.h"
 
-/// One named entity: the character, its name, and whether the character is written by name.
+/// One named entity: the character, its name, and whether the character is written by name. Immutable.
 struct FXmlEntity8
 {
     uint8 character;
@@ -10,6 +10,7 @@ struct FXmlEntity8
     bool encode;
 };
 
+/// The same with 16-bit texts. Immutable.
 struct FXmlEntity16
 {
     char16 character;
