@@ -196,7 +196,7 @@ CmDate CmDate::previous(unsigned dayOfWeek) const
     if (!isValid() || dayOfWeek < 1 || dayOfWeek > kDaysInWeek)
         return CmDate(0u);
     const unsigned daysBack = (weekDay() + kDaysInWeek - dayOfWeek) % kDaysInWeek;
-    return CmDate(julian - (daysBack == 0 ? kDaysInWeek : daysBack));
+    return CmDate(julian - std::min(julian, daysBack == 0 ? kDaysInWeek : daysBack));
 }
 
 CmDate CmDate::previous(const char16* nameOfWeekDay) const
@@ -258,10 +258,11 @@ bool CmDate::fromString(const char16* text)
 
 int32 CmDate::setChecked(unsigned day, unsigned month, unsigned year)
 {
-    const unsigned result = julDay(day, month, year);
-    if (result == 0)
+    const CmDate changed(day, month, year);
+    // The number of a year that is far out wraps around and stands for another one.
+    if (!changed.isValid() || changed.year() != year)
         return kResultInvalidArgument;
-    julian = result;
+    julian = changed.julian;
     return kResultOk;
 }
 
@@ -280,34 +281,22 @@ int32 CmDate::year(int* result)
     return answerNumber(result, year());
 }
 
-// A date that was never set is built up part by part from a first of January.
-void CmDate::beginWhereInvalid()
-{
-    if (!isValid())
-        julian = julDay(1, 1, 1);
-}
-
 int32 CmDate::setDay(int day)
 {
-    beginWhereInvalid();
     return setChecked(static_cast<unsigned>(day), month(), year());
 }
 
 int32 CmDate::setMonth(int month)
 {
-    beginWhereInvalid();
     const auto newMonth = static_cast<unsigned>(month);
     return setChecked(std::min(dayOfMonth(), getDaysInMonth(newMonth, year())), newMonth, year());
 }
 
 int32 CmDate::setYear(int year)
 {
-    if (year < 0)
-        return kResultInvalidArgument;
-    beginWhereInvalid();
     const auto newYear = static_cast<unsigned>(year);
     if (!isValid())
-        return setChecked(1, 1, newYear); // what is put together from an unset date begins at New Year
+        return setChecked(1, 1, newYear);
     return setChecked(std::min(dayOfMonth(), getDaysInMonth(month(), newYear)), month(), newYear);
 }
 

@@ -83,6 +83,7 @@ class CmDate : public CmObject, public IDateModifier
     int32 day(int* result) override;
     int32 month(int* result) override;
     int32 year(int* result) override;
+    // An unset date is put together year first: that gives it a New Year's Day.
     int32 setDay(int day) override;
     int32 setMonth(int month) override;
     int32 setYear(int year) override;
@@ -97,7 +98,6 @@ class CmDate : public CmObject, public IDateModifier
     bool restoreAttributes(FAttributes& attributes) override;
 
 private:
-    void beginWhereInvalid();
     int32 setChecked(unsigned day, unsigned month, unsigned year);
 
     unsigned julian;
