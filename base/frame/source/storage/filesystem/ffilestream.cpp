@@ -227,6 +227,9 @@ int64 FFileStream::seek(int64 position, FSeekMode seekMode)
 {
     if (!isValid() || seekMode < kSeekStart || seekMode > kSeekEnd)
         return -1;
+    // No failure of the file, and expected behind a last line without line end: nothing is stored or told.
+    if (seekMode == kSeekStart && position < 0)
+        return -1;
     keepHookInStep(position, seekMode);
     const int64 reached = seekSystem(position, kSeekOrigins[seekMode]);
     if (reached < 0)

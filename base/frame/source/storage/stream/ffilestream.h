@@ -51,6 +51,7 @@ class FFileStream : public FStream, public ISizeableStream
     // Transfers
     int64 readRaw(void* buffer, int64 count) override;
     int64 writeRaw(const void* buffer, int64 count) override;
+    /// A position before the start is refused and isn't kept as an error.
     int64 seek(int64 position, FSeekMode seekMode) override;
     int64 tell() override;
     void rewind() override;

@@ -59,7 +59,7 @@ bool isBlank(char byte)
 class LineScan
 {
 public:
-    LineScan(FStream& source, bool isTrimming) : stream(source), trim(isTrimming), position(source.tell()) {}
+    LineScan(FStream& source, bool isTrimming) : position(source.tell()), stream(source), trim(isTrimming) {}
 
     /// False at the end of the stream.
     bool run()
@@ -89,6 +89,7 @@ public:
     int64 end = 0;
     /// -1 where the stream ends inside the line.
     int64 next = -1;
+    int64 position;
 
 private:
     bool readByte()
@@ -101,7 +102,6 @@ private:
 
     FStream& stream;
     bool trim;
-    int64 position;
     char byte = 0;
 };
 } // namespace
@@ -207,7 +207,9 @@ bool FStream::readLine(CmBuffer& line, bool trim)
         line.setFillSize(static_cast<uint32>(std::max<int64>(readRaw(line.ptr(), length), 0)));
     }
     line.ptr()[line.getFillSize()] = 0;
-    // -1 goes to the stream as well: a file refuses it and stays at its end.
+    // -1 goes to the stream as well: a file refuses it and stays at its end, behind blanks that were left out.
+    if (scan.next < 0)
+        seek(scan.position, kSeekStart);
     seek(scan.next, kSeekStart);
     return true;
 }
