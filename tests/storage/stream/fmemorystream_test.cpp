@@ -84,6 +84,9 @@ TEST(FMemoryStream, PassesItsBlock)
     EXPECT_EQ(stream.getAllocated(), 0);
     EXPECT_EQ(readFrom(stream, 3), "");
     EXPECT_EQ(writeTo(stream, "ab"), 0) << "inside the size that is left there is no block";
+    FMemoryStream target, copy(stream);
+    EXPECT_TRUE(stream.copyTo(target));
+    EXPECT_EQ(target.getSize() + copy.getSize(), 0) << "nothing is made up in its place";
     stream.reset();
     EXPECT_EQ(writeTo(stream, "ab"), 2);
 }

@@ -9,7 +9,7 @@ static constexpr const char* kDataKey = "Data";
 
 bool FMemoryStream::externalize(FArchive& archive) const
 {
-    const int64 stored = data ? size : 0;
+    const int64 stored = storedSize();
     if (stored > std::numeric_limits<int32>::max())
         return false;
     FStream& stream = archive.getStream();
@@ -47,7 +47,7 @@ bool FMemoryStream::readGrowing(FStream& from, int64 count)
 
 bool FMemoryStream::storeAttributes(FAttributes& attributes) const
 {
-    const int64 stored = data ? size : 0;
+    const int64 stored = storedSize();
     return stored <= std::numeric_limits<uint32>::max() &&
            attributes.setBinary(kDataKey, data, static_cast<uint32>(stored));
 }

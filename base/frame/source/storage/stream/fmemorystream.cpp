@@ -85,7 +85,7 @@ void FMemoryStream::copyBytes(const FMemoryStream& other)
     ownsMemory = true;
     allocationError = false;
     cursor = 0;
-    writeRaw(other.data, other.size);
+    writeRaw(other.data, other.storedSize());
 }
 
 void FMemoryStream::dropBlock()
@@ -263,7 +263,7 @@ bool FMemoryStream::read(FStream& from, uint32 count)
         return FStream::read(from, count);
 
     const int64 rest = memory->cursor < 0 ? 0 : std::max<int64>(memory->size - memory->cursor, 0);
-    const int64 taken = writeRaw(memory->data + memory->cursor, std::min<int64>(rest, count));
+    const int64 taken = rest > 0 ? writeRaw(memory->data + memory->cursor, std::min<int64>(rest, count)) : 0;
     memory->seek(taken, kSeekCurrent);
     // What the other stream didn't have.
     if (const int64 unset = std::max(cursor, oldSize); unset < size)
@@ -274,7 +274,8 @@ bool FMemoryStream::read(FStream& from, uint32 count)
 bool FMemoryStream::copyTo(FStream& to)
 {
     rewind();
-    return to.writeRaw(data, size) == size;
+    const int64 stored = storedSize();
+    return stored == 0 || to.writeRaw(data, stored) == stored;
 }
 
 int32 FMemoryStream::getStreamSize(int64& result)

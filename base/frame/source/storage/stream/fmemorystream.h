@@ -51,7 +51,7 @@ class FMemoryStream : public FStream, public ISizeableStream, public IMemoryStre
 
     void rewind() override { cursor = 0; }
     bool verify() override { return !allocationError; }
-    /// False also where the other stream has fewer bytes.
+    /// False also where the other stream is one in memory and has fewer bytes.
     bool read(FStream& from, uint32 count) override;
     bool copyTo(FStream& to) override;
     int32 getStreamSize(int64& result) override;
@@ -66,6 +66,8 @@ class FMemoryStream : public FStream, public ISizeableStream, public IMemoryStre
     bool fromAttributes(const char* key, FAttributes& attributes);
 
 private:
+    /// The size, 0 where the block was passed on.
+    int64 storedSize() const { return data ? size : 0; }
     bool reallocate(int64 newAllocation);
     bool readGrowing(FStream& from, int64 count);
     bool includeEnd(int64 end);
