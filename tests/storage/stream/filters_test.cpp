@@ -3,6 +3,7 @@
 #include "storage/stream/fblockstreamreader.h"
 #include "storage/stream/fbufferedstream.h"
 #include "storage/stream/fbufferstream.h"
+#include "storage/stream/fcompressionstream.h"
 #include "storage/stream/ffilestream.h"
 #include "storage/stream/fstreamproxy.h"
 #include "streamfixture.h"
@@ -146,15 +147,24 @@ TEST(FBufferedStream, LeavesAFileAtItsTrueLength)
 TEST(FStream, AFileStaysAtItsEndBehindTheLastLine)
 {
     auto file = temporaryFile();
-    writeTo(*file, "first\nlast");
-    file->rewind();
-    CmBuffer line;
-    EXPECT_TRUE(file->readLine(line, false));
-    EXPECT_STREQ(line.str8(), "first");
-    EXPECT_TRUE(file->readLine(line, false));
-    EXPECT_STREQ(line.str8(), "last");
-    EXPECT_EQ(file->tell(), 10);
-    EXPECT_FALSE(file->readLine(line, false));
+    writeTo(*file, "first\nlast \t");
+    TestHook hook;
+    file->setReadWriteHook(&hook, 0);
+    for (bool trim : {false, true})
+    {
+        file->rewind();
+        CmBuffer line;
+        EXPECT_TRUE(file->readLine(line, trim));
+        EXPECT_STREQ(line.str8(), "first");
+        EXPECT_TRUE(file->readLine(line, trim));
+        EXPECT_STREQ(line.str8(), trim ? "last" : "last \t");
+        EXPECT_EQ(file->tell(), 12) << "behind blanks that were left out, too";
+        EXPECT_EQ(hook.getValue(), 12);
+        EXPECT_FALSE(file->readLine(line, trim));
+    }
+    EXPECT_FALSE(file->error()) << "to be sought before its start is no failure of the file";
+    EXPECT_EQ(file->seek(-100, kSeekCurrent), -1);
+    EXPECT_TRUE(file->error());
 }
 
 TEST(FBufferedStream, AReaderStaysInsideTheStream)
@@ -182,6 +192,41 @@ TEST(FBufferedStream, AReaderStaysInsideTheStream)
     auto copy = adopt(FCast(FStream, stream.newCopy()));
     EXPECT_EQ(copy->seek(-1, kSeekCurrent), 40);
     EXPECT_EQ(readFrom(*copy, 2), "b");
+}
+
+TEST(FBufferedStream, KeepsBytesThatItCannotRead)
+{
+    auto inner = adopt(new CountingStream);
+    writeTo(*inner, std::string(40, 'a'));
+    inner->seek(-1, kSeekStart);
+    FBufferedStream stream(inner, 16, true, nullptr);
+    EXPECT_EQ(stream.tell(), 0) << "also over a stream that stands before its start";
+    inner->failsReading = true;
+    EXPECT_EQ(writeTo(stream, "abc"), -1);
+    stream.flush();
+    EXPECT_EQ(bytesOf(*inner), std::string(40, 'a'));
+    inner->failsReading = false;
+    EXPECT_EQ(writeTo(stream, "abc"), 3);
+    stream.flush();
+    EXPECT_EQ(bytesOf(*inner), "abc" + std::string(37, 'a'));
+}
+
+TEST(FStream, FiltersTakeOrderAndTypeOfWhatTheyWrap)
+{
+    auto inner = adopt(new FMemoryStream);
+    inner->setByteOrder(1);
+    inner->setFileType(FFileType("audio/wav", "wav", nullptr, 0, "Wave"));
+    FBufferedStream buffered(nullptr, 16, false, nullptr);
+    buffered.setStream(inner);
+    FBlockStreamReader reader(inner, 16);
+    FCompressionStream packed(inner, nullptr);
+    FStreamProxy window(inner, 0, 0, 0);
+    for (const FStream* filter : {static_cast<FStream*>(&buffered), static_cast<FStream*>(&reader),
+                                  static_cast<FStream*>(&packed), static_cast<FStream*>(&window)})
+    {
+        EXPECT_EQ(filter->getByteOrder(), 1) << filter->isA();
+        EXPECT_TRUE(filter->getFileType() == inner->getFileType()) << filter->isA();
+    }
 }
 
 TEST(FBufferedStream, TellsItsHookAndObeysIt)

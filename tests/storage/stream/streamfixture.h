@@ -42,7 +42,7 @@ class CountingStream : public FMemoryStream
     int64 readRaw(void* target, int64 count) override
     {
         reads++;
-        return FMemoryStream::readRaw(target, count);
+        return failsReading ? -1 : FMemoryStream::readRaw(target, count);
     }
     int64 writeRaw(const void* source, int64 count) override
     {
@@ -54,6 +54,7 @@ class CountingStream : public FMemoryStream
     int reads = 0;
     int writes = 0;
     int flushes = 0;
+    bool failsReading = false;
     bool failsWriting = false;
 };
 

@@ -38,9 +38,9 @@ void FBufferedStream::finish()
     if (!stream || (flags & kWritable) == 0)
         return;
     flush();
-    // The last block was written whole.
+    // The last block was written whole. A file that is too short has lost data and isn't made to look complete.
     auto* file = FCast(FFileStream, stream.get());
-    if (file && file->getEof() != streamEnd)
+    if (file && file->getEof() > streamEnd)
         file->setEof(streamEnd);
 }
 
@@ -56,9 +56,10 @@ void FBufferedStream::setStream(FStream* newStream)
 
     fileType = stream->getFileType();
     byteOrder = stream->getByteOrder();
-    cursor = stream->tell();
+    // A closed stream stands nowhere, and one in memory may stand before its start.
+    cursor = std::max<int64>(stream->tell(), 0);
     blockIndex = cursor / blockSize();
-    streamEnd = stream->seek(0, kSeekEnd);
+    streamEnd = std::max<int64>(stream->seek(0, kSeekEnd), 0);
     stream->seek(cursor, kSeekStart);
 }
 
@@ -105,11 +106,11 @@ bool FBufferedStream::loadBlock()
 {
     const int64 wanted = std::min(blockSize(), streamEnd - blockStart());
     if (wanted <= 0)
-        return false;
+        return true;
     stream->seek(blockStart(), kSeekStart);
-    const int64 got = std::max<int64>(stream->readRaw(buffer->ptr(), wanted), 0);
-    buffer->setFillSize(static_cast<uint32>(got));
-    return got > 0;
+    const int64 got = stream->readRaw(buffer->ptr(), wanted);
+    buffer->setFillSize(static_cast<uint32>(std::max<int64>(got, 0)));
+    return got >= 0;
 }
 
 int64 FBufferedStream::readRaw(void* target, int64 count)
@@ -146,7 +147,12 @@ int64 FBufferedStream::writeRaw(const void* source, int64 count)
     const auto* bytes = static_cast<const char*>(source);
     int64 done = 0;
     while (done < count)
-        done += writeToBlock(bytes + done, count - done);
+    {
+        const int64 taken = writeToBlock(bytes + done, count - done);
+        if (taken < 0)
+            return done > 0 ? done : -1;
+        done += taken;
+    }
     return done;
 }
 
@@ -163,8 +169,8 @@ int64 FBufferedStream::writeAligned(const void* source, int64 count)
 int64 FBufferedStream::writeToBlock(const char* source, int64 count)
 {
     // The block's other bytes must not be lost.
-    if (buffer->getFillSize() == 0)
-        loadBlock();
+    if (buffer->getFillSize() == 0 && !loadBlock())
+        return -1;
     flags |= kDirty;
     const int64 offset = cursor - blockStart();
     const int64 taken = std::min(count, blockSize() - offset);

@@ -50,8 +50,10 @@ private:
     int64 blockSize() const { return buffer->getSize(); }
     bool isCanceled() const;
     void tellHook(int64 target) const;
+    /// False where the block can't be read; nothing is read behind the end of the stream.
     bool loadBlock();
     int64 writeAligned(const void* source, int64 count);
+    /// How many bytes the block took; -1 where its other bytes can't be read.
     int64 writeToBlock(const char* source, int64 count);
 
     IPtr<FStream> stream;
