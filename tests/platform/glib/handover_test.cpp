@@ -79,6 +79,8 @@ private:
             modal = true;
         if (command == "vlmr:slowly")
             endsSlowly = true;
+        if (command == "vlmr:never")
+            FThreadSleep(-1);
         if (command == "vlmr:slowly" || command == "vlmr:end")
             gController->quit(false);
     }
@@ -262,4 +264,17 @@ TEST_F(HandOver, WithoutABusEachStartIsAProcessOfItsOwn)
     kill(first, SIGTERM);
     EXPECT_EQ(waitForExit(first), 0) << "a termination ends the run in order";
     awaitLine("gone", 2);
+}
+
+TEST_F(HandOver, AProcessThatCannotAnswerIsEndedByTheSecondSignal)
+{
+    const pid_t first = start("here", {"vlmr:never"});
+    awaitLine("url vlmr:never");
+    kill(first, SIGTERM);
+    FThreadSleep(50);
+    EXPECT_EQ(waitpid(first, nullptr, WNOHANG), 0) << "it still has the first one to answer";
+    kill(first, SIGTERM);
+    int status = 0;
+    waitpid(first, &status, 0);
+    EXPECT_TRUE(WIFSIGNALED(status));
 }

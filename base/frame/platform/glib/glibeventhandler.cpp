@@ -127,7 +127,14 @@ void GlibEventHandler::collectArguments(const std::vector<std::string>& argument
 void GlibEventHandler::watchTermination()
 {
     for (int signal : {SIGTERM, SIGHUP})
+    {
         terminationSources.push_back(g_unix_signal_add(signal, &GlibEventHandler::onTermination, this));
+        // Only the first one is a question: a second ends a process that can't answer at once.
+        struct sigaction action;
+        sigaction(signal, nullptr, &action);
+        action.sa_flags |= static_cast<int>(SA_RESETHAND);
+        sigaction(signal, &action, nullptr);
+    }
 }
 
 gboolean GlibEventHandler::onTermination(gpointer)

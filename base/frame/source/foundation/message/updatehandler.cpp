@@ -11,6 +11,7 @@ DEFINE_INTERFACE_ID(IUpdateManager, 0x3C6E0F2B, 0x9D4A4E17, 0xA5B80D61, 0x7F29C3
 namespace
 {
 constexpr int32 kUnusableArgument = 1;
+constexpr int kBucketPlaces = 10;
 
 FObject* theHandler = nullptr;
 
@@ -31,6 +32,8 @@ void tellUpdateDone(FUnknown* object, int message)
 
 UpdateHandler::UpdateHandler()
 {
+    for (Bucket& bucket : dependentTable)
+        bucket.resize(kBucketPlaces);
     if (!gUpdateHandler)
         gUpdateHandler = this;
 }
