@@ -5,9 +5,6 @@
 #include "storage/attribute/fattributes.h"
 #include "storage/attribute/fxmlobject.h"
 
-#include <charconv>
-#include <cstring>
-
 namespace
 {
 constexpr int32 kNoSuchValue = 1;
@@ -20,11 +17,7 @@ bool toKey(const char* text, const char*& key)
 
 bool toKey(const char* text, unsigned int& key)
 {
-    if (!text)
-        return false;
-    const char* end = text + strlen(text);
-    const auto result = std::from_chars(text, end, key);
-    return result.ec == std::errc() && result.ptr == end;
+    return text && FIntIDAttribute::parseKey(text, key);
 }
 
 std::string toText(const char* key)

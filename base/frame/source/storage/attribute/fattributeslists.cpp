@@ -1,7 +1,6 @@
 #include "foundation/text/string.h"
 #include "storage/attribute/fattributes.h"
 
-#include <charconv>
 #include <cstring>
 
 // Copying between an attribute tree and the lists of components.
@@ -15,13 +14,6 @@ bool isListValue(const FAttributeValue& value)
     return value.getType() & (FAttributeValue::kInteger | FAttributeValue::kFloat | FAttributeValue::kString);
 }
 
-bool parseKey(const char* text, unsigned int& key)
-{
-    const char* end = text + strlen(text);
-    const auto result = std::from_chars(text, end, key);
-    return result.ec == std::errc() && result.ptr == end;
-}
-
 /// The key in the list; false where the list has no such key.
 template <class List>
 bool toListKey(const char* key, const char*& result)
@@ -32,7 +24,7 @@ bool toListKey(const char* key, const char*& result)
 template <class List>
 bool toListKey(const char* key, unsigned int& result)
 {
-    return parseKey(key, result) && result != FAttributes::kAdditionalAttributes;
+    return FIntIDAttribute::parseKey(key, result) && result != FAttributes::kAdditionalAttributes;
 }
 
 void setAdditional(FIntAttributeList& list, FAttributes* tree)

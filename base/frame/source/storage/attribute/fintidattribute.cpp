@@ -3,7 +3,17 @@
 #include "storage/attribute/farchive.h"
 #include "storage/stream/fstream.h"
 
+#include <charconv>
+#include <cstring>
+
 DEFINE_CLASS(FIntIDAttribute, FAttributeValue)
+
+bool FIntIDAttribute::parseKey(const char* text, unsigned int& key)
+{
+    const char* end = text + strlen(text);
+    const auto result = std::from_chars(text, end, key);
+    return result.ec == std::errc() && result.ptr == end;
+}
 
 bool FIntIDAttribute::isEqual(const CmObject* other) const
 {

@@ -12,6 +12,8 @@ class FIntIDAttribute : public FAttributeValue
 
     unsigned int getKey() const { return id; }
     int compareKey(unsigned int key) const { return id < key ? -1 : id > key; }
+    /// Reads a key from decimal digits; false where `text` is anything else or too great.
+    static bool parseKey(const char* text, unsigned int& key);
 
     bool isEqual(const CmObject* other) const override;
     int compare(const CmObject* other) const override;
