@@ -84,7 +84,9 @@ TEST_F(Start, OfASecondProcessAddsToTheUploadsOfTheFirst)
     ASSERT_TRUE(service->waitForStalled(1, kHangs));
     ASSERT_TRUE(first.process->waitForOutput("(1 of 1)"));
 
-    const std::string secondFile = writeDescription(minimal(), "second.xml");
+    SampleDescription second = minimal();
+    second.configuration({{"RequireLogin", "true"}});
+    const std::string secondFile = writeDescription(second, "second.xml");
     EXPECT_EQ(run({"second.xml"}), "") << "the second start hands over and ends";
     EXPECT_TRUE(first.process->waitForOutput("(1 of 2)"));
     EXPECT_FALSE(exists(firstFile)) << "it was let go when the second came";
@@ -93,6 +95,7 @@ TEST_F(Start, OfASecondProcessAddsToTheUploadsOfTheFirst)
 
     EXPECT_EQ(received("/tracks").size(), 2u);
     EXPECT_FALSE(exists(secondFile));
+    EXPECT_TRUE(received("/connect").empty()) << "no new login while an upload is under way";
 }
 
 TEST_F(Start, OfASecondProcessForAnotherProductIsRefused)

@@ -76,6 +76,17 @@ TEST_F(Run, ShowsAFatalErrorAloneAndOnlyAtAPulse)
     EXPECT_TRUE(isQuitting());
 }
 
+TEST_F(Run, ThrowsAwayADescriptionThatComesWhileAQuestionStands)
+{
+    std::string file = write("second.xml", "<AudioExportDescription/>");
+    IPtr<FNPath> path = adopt(new FNPath(FPath::kFile));
+    path->fromPlatformPath(file.c_str());
+    app->setModalAlertActive(true);
+    EXPECT_FALSE(app->openFile(path, nullptr));
+    EXPECT_FALSE(std::filesystem::exists(file));
+    EXPECT_EQ(fatal(), "");
+}
+
 TEST_F(Run, IsNotEndedByWhatAFormerOneSaidAtItsEnd)
 {
     add();
