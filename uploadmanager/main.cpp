@@ -15,7 +15,6 @@ int main(int argc, char** argv)
     Argc = argc;
     Argv = argv;
     PlatformServices::raiseLimits();
-    PlatformServices::surviveBrokenPipes();
     // The platform's side exists before any other object of the framework.
     IPlatformEventHandler::instance();
     return AppMain();

@@ -2,7 +2,6 @@
 
 #include <cerrno>
 #include <climits>
-#include <csignal>
 #include <cstdlib>
 
 #include <pwd.h>
@@ -70,11 +69,6 @@ void PlatformServices::raiseLimits()
     getrlimit(RLIMIT_STACK, &stack);
     stack.rlim_cur = stack.rlim_max;
     setrlimit(RLIMIT_STACK, &stack);
-}
-
-void PlatformServices::surviveBrokenPipes()
-{
-    signal(SIGPIPE, SIG_IGN);
 }
 
 std::string PlatformServices::getExecutablePath()

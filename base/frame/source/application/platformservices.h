@@ -8,9 +8,6 @@ namespace PlatformServices
 {
 /// Lets the process open up to 10240 files, and gives it all the stack that it may have. A refusal is no error.
 void raiseLimits();
-/// Makes a write to a pipe or connection that nobody reads any more a failure of that write, in all threads, instead of
-/// the end of the process. Programs that are started from here begin as usual.
-void surviveBrokenPipes();
 
 /// The file of the running program.
 std::string getExecutablePath();
