@@ -99,6 +99,15 @@ TEST(CmTime, PrintsLengthsOfTime)
     EXPECT_EQ(text, "takes 1 min 1 s");
 }
 
+TEST(CmTime, ComparesAndHashesByItsSeconds)
+{
+    const CmTime early(5u), late(3000000000u);
+    EXPECT_LT(early.compare(&late), 0);
+    EXPECT_GT(late.compare(&early), 0) << "also beyond what a signed number holds";
+    EXPECT_TRUE(early.isEqual(&static_cast<const CmObject&>(CmTime(5u))));
+    EXPECT_EQ(early.hash(4), 1u);
+}
+
 TEST(CmTime, TheCurrentTimeHasNoDatePart)
 {
     EXPECT_LT(CmTime().getSeconds(), 86400u);
