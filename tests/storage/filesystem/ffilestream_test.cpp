@@ -1,5 +1,6 @@
 #include "storage/stream/ffilestream.h"
 
+#include "storage/stream/fbufferedstream.h"
 #include "storage/stream/uprogresshook.h"
 #include "tests/storage/filefixture.h"
 
@@ -182,6 +183,21 @@ TEST_F(FileTest, DirectFilesLeaveNothingReservedBehind)
     EXPECT_TRUE(files->closeFile(stream));
     EXPECT_EQ(contentOf("a"), "abc");
     EXPECT_LT(std::filesystem::file_size(root + "/a"), 4u);
+}
+
+TEST_F(FileTest, ACacheDoesNotLengthenAFileThatLostData)
+{
+    FFileStream* file = FCast(FFileStream, files->createFile(at("a"), kFileWrite | kFileDirect, nullptr));
+    {
+        FBufferedStream cache(file, 4096, true, nullptr);
+        const SizeLimit limit(4096);
+        const std::string bytes(10000, 'x');
+        cache.writeRaw(bytes.data(), 10000);
+        cache.flush();
+        EXPECT_FALSE(cache.verify());
+    }
+    EXPECT_EQ(file->getEof(), 4096);
+    EXPECT_FALSE(files->closeFile(file));
 }
 
 TEST_F(FileTest, BufferedWritesArriveWithoutClosing)
