@@ -2,27 +2,17 @@
 
 #include "foundation/object/fvariant.h"
 #include "foundation/object/stringhash.h"
+#include "foundation/object/textcopy.h"
 #include "foundation/text/string.h"
 
 #include <cmath>
 #include <cstdlib>
 #include <limits>
-#include <string>
 
 DEFINE_CLASS(CmVariant, CmObject)
 
 namespace
 {
-template <class Character>
-const Character* copyText(const Character* text)
-{
-    if (!text)
-        return nullptr;
-    const size_t bytes = (std::char_traits<Character>::length(text) + 1) * sizeof(Character);
-    void* copy = malloc(bytes);
-    return copy ? static_cast<const Character*>(memcpy(copy, text, bytes)) : nullptr;
-}
-
 int64 nearestInteger(double number)
 {
     // The greatest integers have no exact double; 2^63 is the first beyond them.
@@ -327,9 +317,9 @@ void CmVariant::emancipate()
     if (isObject())
         value.object->addRef();
     else if ((type & kText8) != 0)
-        value.text8 = copyText(value.text8);
+        value.text8 = copyOfText(value.text8);
     else if ((type & kText16) != 0)
-        value.text16 = copyText(value.text16);
+        value.text16 = copyOfText(value.text16);
     setOwner(true);
 }
 

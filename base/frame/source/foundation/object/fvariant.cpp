@@ -1,22 +1,9 @@
 #include "foundation/object/fvariant.h"
 
-#include <cstdlib>
-#include <cstring>
-#include <string>
-#include <utility>
+#include "foundation/object/textcopy.h"
 
-namespace
-{
-template <class Character>
-const Character* copyText(const Character* text)
-{
-    if (!text)
-        return nullptr;
-    const size_t bytes = (std::char_traits<Character>::length(text) + 1) * sizeof(Character);
-    void* copy = malloc(bytes);
-    return copy ? static_cast<const Character*>(memcpy(copy, text, bytes)) : nullptr;
-}
-} // namespace
+#include <cstdlib>
+#include <utility>
 
 FVariant& FVariant::operator=(const FVariant& other)
 {
@@ -88,9 +75,9 @@ void FVariant::assign(const FVariant& other)
     type = other.getType();
     value = other.value;
     if (type == kString8)
-        value.text8 = copyText(other.value.text8);
+        value.text8 = copyOfText(other.value.text8);
     else if (type == kString16)
-        value.text16 = copyText(other.value.text16);
+        value.text16 = copyOfText(other.value.text16);
     else if (type == kObject && value.object)
         value.object->addRef();
     setOwner(true);
