@@ -109,6 +109,7 @@ TEST(ValueForms, MemoryStreamsComeBackRewound)
     }
     FMemoryStream empty;
     EXPECT_TRUE(externalizeAndInternalize(empty, restored[1]));
+    EXPECT_EQ(bytesOf(restored[1]), "abcdef") << "a stored size of 0 changes nothing";
 
     FAttributes tree;
     tree.setBinary("key", "xyz", 3);
