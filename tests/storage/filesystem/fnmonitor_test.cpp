@@ -81,13 +81,15 @@ TEST_F(FNMonitorTest, TellsOfChangesByOthers)
     ASSERT_TRUE(monitor->start());
     std::filesystem::create_directory(root + "/watched");
     ASSERT_TRUE(monitor->registerPath(&listener, at("watched")));
-    for (int i = 0; i < 20; i++)
-        put("watched/file", std::string(static_cast<size_t>(i), 'x'));
-    EXPECT_EQ(nextChanges(), Changes{"3 " + root + "/watched"}) << "a burst is one change";
+    for (int i = 0; i < 50; i++)
+        put("watched/file" + std::to_string(i), "x");
+    EXPECT_EQ(nextChanges().front(), "3 " + root + "/watched");
     std::filesystem::remove_all(root + "/watched");
+    int told = 1;
     Changes changes = nextChanges();
-    while (changes.back() != "2 " + root + "/watched")
-        changes = nextChanges();
+    for (; changes.back() != "2 " + root + "/watched"; changes = nextChanges())
+        told += static_cast<int>(changes.size());
+    EXPECT_LT(told, 50) << "a burst is one change, not one for each file";
 }
 
 TEST_F(FNMonitorTest, TellsOfChangesByTheProgram)
@@ -171,8 +173,8 @@ TEST_F(FNMonitorTest, ExcludedFoldersStayUntoldByTheThread)
     EXPECT_TRUE(monitor->registerPath(&listener, at("quiet")));
     EXPECT_TRUE(monitor->registerPath(&listener, at("loud")));
     ASSERT_TRUE(monitor->start()) << "what was registered before is watched";
-    put("quiet/file", "x");
-    put("loud/file", "x");
+    std::filesystem::create_directory(root + "/quiet/file");
+    std::filesystem::create_directory(root + "/loud/file");
     EXPECT_EQ(nextChanges(), Changes{"3 " + root + "/loud"});
 }
 
@@ -183,11 +185,11 @@ TEST_F(FNMonitorTest, FoldersBelowAreWatchedOnDemand)
     EXPECT_FALSE(monitor->addPath(at("missing"), 0));
     EXPECT_TRUE(monitor->addPath(at("a"), FNMonitor::kRecursive));
     EXPECT_TRUE(monitor->registerPath(&listener, at("a")));
-    put("a/b/file", "x");
+    std::filesystem::create_directory(root + "/a/b/file");
     EXPECT_EQ(nextChanges(), Changes{"3 " + root + "/a/b"});
     monitor->removePath(at("a"));
-    put("a/b/file", "y");
-    put("a/file", "y");
+    std::filesystem::create_directory(root + "/a/b/other");
+    std::filesystem::create_directory(root + "/a/file");
     EXPECT_EQ(nextChanges(), Changes{"3 " + root + "/a"}) << "the listener's own folder is still watched";
 }
 

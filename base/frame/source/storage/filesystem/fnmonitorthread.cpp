@@ -62,9 +62,12 @@ void FNMonitorThread::remove(const FNPath& folder)
 
 int FNMonitorThread::entry()
 {
-    int number = -1;
-    while (handle(watcher->wait(pending.empty() ? -1 : kBurstMs, number), number))
+    bool goesOn = true;
+    while (goesOn)
     {
+        int number = -1;
+        const IFileWatcher::Happening happening = watcher->wait(pending.empty() ? -1 : kBurstMs, number);
+        goesOn = handle(happening, number);
     }
     postPending();
     return 0;
