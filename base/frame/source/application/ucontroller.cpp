@@ -102,8 +102,9 @@ UController::UController(int applicationType)
 
 UController::~UController()
 {
-    if (gMessenger)
-        gMessenger->killMessages(this, nullptr);
+    // The global pointer is cleared by now, but a "Quit" may still wait for this receiver.
+    if (FMessenger* messenger = FMessenger::instance())
+        messenger->killMessages(this, nullptr);
     destroyDeferred();
     IPlatformEventHandler::instance()->close(true);
     UAlert::setPermission(nullptr);
