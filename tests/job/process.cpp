@@ -85,6 +85,12 @@ std::optional<int> Process::wait(std::chrono::milliseconds time)
     return result;
 }
 
+void Process::terminate()
+{
+    if (!result)
+        kill(child, SIGTERM);
+}
+
 long Process::peakMemory() const
 {
     const std::string status = contentsOf("/proc/" + std::to_string(child) + "/status");

@@ -36,6 +36,9 @@ public:
     std::optional<int> wait(std::chrono::milliseconds time);
     bool isRunning() { return !wait(std::chrono::milliseconds(0)); }
 
+    /// Asks it to end, as a session does that ends.
+    void terminate();
+
     /// All that it has written so far.
     std::string output() const;
 

@@ -130,6 +130,19 @@ TEST_F(Start, OfALogoutEndsARunWhoseUploadStandsStill)
     EXPECT_EQ(contentsOf(userFile("scat")), attributeFile("scat", {{"Loomrit", ""}}));
 }
 
+TEST_F(Start, EndsWithTheSessionAndLosesNothing)
+{
+    logIn();
+    service->plan("/tracks stall 0");
+    const std::string file = writeDescription(minimal());
+    Run first = start({file});
+    ASSERT_TRUE(service->waitForStalled(1, kHangs));
+    ASSERT_TRUE(first.process->waitForOutput("(1 of 1)"));
+    first.process->terminate();
+    first.finish();
+    EXPECT_TRUE(exists(file));
+}
+
 TEST_F(Start, PrefersTheHostsOfTheUserFolder)
 {
     logIn();
