@@ -1,5 +1,7 @@
 #include "tests/job/job.h"
 
+#include <thread>
+
 namespace
 {
 
@@ -96,6 +98,23 @@ TEST_F(Start, OfASecondProcessAddsToTheUploadsOfTheFirst)
     EXPECT_EQ(received("/tracks").size(), 2u);
     EXPECT_FALSE(exists(secondFile));
     EXPECT_TRUE(received("/connect").empty()) << "no new login while an upload is under way";
+}
+
+TEST_F(Start, AtAnyMomentOfTheEndOfAnotherRunLosesNothing)
+{
+    logIn();
+    constexpr int kRounds = 12;
+    for (int round = 0; round < kRounds; ++round)
+    {
+        Run first = start({writeDescription(minimal(), "first.xml")});
+        ASSERT_TRUE(service->waitForRequests("/tracks", 2 * round + 1, kHangs));
+        std::this_thread::sleep_for(std::chrono::milliseconds(7 * round));
+        Run second = start({writeDescription(minimal(), "second.xml")});
+        second.finish();
+        first.finish();
+        EXPECT_EQ(received("/tracks").size(), static_cast<std::size_t>(2 * round + 2)) << round;
+        EXPECT_FALSE(exists(exports / "first.xml") || exists(exports / "second.xml")) << round;
+    }
 }
 
 TEST_F(Start, OfASecondProcessForAnotherProductIsRefused)
