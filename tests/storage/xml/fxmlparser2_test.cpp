@@ -85,8 +85,8 @@ TEST(FXmlParser2, TakesAFailingStreamForOneThatEnds)
 {
     struct BrokenStream : TextStream
     {
-        using TextStream::TextStream;
         using TextStream::read;
+        using TextStream::TextStream;
         int32 read(void* bytes, int count, int* done) override
         {
             return --goodReads < 0 ? kStreamFailed : TextStream::read(bytes, count, done);
