@@ -65,6 +65,8 @@ TEST(Comparison, ComparesWhatStandsBehindAnIndex)
     EXPECT_EQ(ConstString("abc").compareAt(3, ""), 0);
     EXPECT_EQ(ConstString("abc").compareAt(3, "c"), -1);
     EXPECT_EQ(ConstString("abc").compareAt(2, ""), 1);
+    EXPECT_EQ(ConstString("abc").compareAt(2, "x", 0), 0);
+    EXPECT_EQ(ConstString(u"xabc").compareAt(1, "abd", 2), 0);
 }
 
 TEST(Comparison, FindsTheFirstDifference)

@@ -4,6 +4,24 @@
 
 #include <gtest/gtest.h>
 
+namespace
+{
+/// Takes 8-bit text only.
+struct NarrowResult : IStringResult
+{
+    int32 queryInterface(const char*, void** object) override
+    {
+        *object = nullptr;
+        return kNoInterface;
+    }
+    uint32 addRef() override { return 1; }
+    uint32 release() override { return 1; }
+    void setText(const char* given) override { text = given; }
+
+    std::string text;
+};
+} // namespace
+
 TEST(ConstString, ViewsWhatItIsMadeOf)
 {
     EXPECT_EQ(shape(ConstString()), "narrow:");
@@ -94,8 +112,12 @@ TEST(ConstString, Extracts)
     EXPECT_EQ(shape(part), "narrow:bc");
 
     String itself("abcdef");
-    EXPECT_TRUE(itself.extract(itself, 1, 2));
+    EXPECT_TRUE(itself.extract(itself, 1, 4));
+    EXPECT_EQ(shape(itself), "narrow:bcde");
+    EXPECT_TRUE(itself.extract(itself, 0, 2));
     EXPECT_EQ(shape(itself), "narrow:bc");
+    EXPECT_TRUE(itself.extract(itself, 1, 0));
+    EXPECT_EQ(shape(itself), "narrow:");
 }
 
 TEST(ConstString, CopiesIntoBuffersOfEitherWidth)
@@ -124,6 +146,12 @@ TEST(ConstString, HandsItsTextOverInItsWidth)
     ConstString(u"result").copyTo(static_cast<IStringResult*>(&target));
     EXPECT_EQ(shape(target), "wide:result");
     EXPECT_EQ(target.getRefCount(), 1u);
+
+    NarrowResult narrowOnly;
+    const String source(u"a\u00E4");
+    source.copyTo(&narrowOnly);
+    EXPECT_EQ(narrowOnly.text, "a\x8A");
+    EXPECT_TRUE(source.isWideString()) << "handing over must not convert";
 }
 
 TEST(ConstString, SortsCharactersIntoClasses)

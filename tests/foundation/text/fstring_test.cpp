@@ -1,5 +1,8 @@
+#include "foundation/object/iptr.h"
+#include "foundation/text/cmstring.h"
 #include "foundation/text/fbase64.h"
 #include "foundation/text/fstring.h"
+#include "storage/attribute/fnewarchive.h"
 #include "storage/stream/fmemorystream.h"
 #include "texts.h"
 
@@ -46,6 +49,32 @@ TEST(FString, StoresBothWidths)
     EXPECT_TRUE(FString::storeString16(stream, nullptr));
     EXPECT_EQ(std::string(stream.getData(), static_cast<std::size_t>(stream.getSize())),
               withLength(3, "ab" + kZero) + withLength(6, "ä" + kZero + kMarker) + withLength(0, ""));
+}
+
+TEST(FString, GoesThroughStreamsOfOtherByteOrderAndArchives)
+{
+    FMemoryStream stream;
+    stream.setByteOrder(1);
+    EXPECT_TRUE(FString(u"ä").store(stream));
+    const std::string bytes(stream.getData(), static_cast<std::size_t>(stream.getSize()));
+    EXPECT_EQ(bytes, std::string("\0\0\0\6", 4) + "ä" + kZero + kMarker);
+    stream.rewind();
+    FString text;
+    EXPECT_TRUE(text.load(stream));
+    EXPECT_EQ(shape(text), "wide:ä");
+
+    const auto file = adopt(new FMemoryStream);
+    FNewArchive writer(file, true);
+    EXPECT_TRUE(CmString(u"ä").externalize(writer));
+    EXPECT_TRUE(CmString("narrow").externalize(writer));
+    file->rewind();
+    FNewArchive reader(file, false);
+    for (const char* expected : {"wide:ä", "narrow:narrow"})
+    {
+        CmString restored;
+        EXPECT_TRUE(restored.internalize(reader));
+        EXPECT_EQ(shape(restored), expected);
+    }
 }
 
 TEST(FString, LoadsEveryFormThatWasEverWritten)

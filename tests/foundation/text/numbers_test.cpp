@@ -49,6 +49,9 @@ TEST(NumberScan, TakesEitherDecimalSeparator)
     double value = 0;
     EXPECT_TRUE(ConstString("1,5").scanFloat(value));
     EXPECT_EQ(value, 1.5);
+    EXPECT_TRUE(ConstString(u"-1,5").scanFloat(value));
+    EXPECT_EQ(value, -1.5);
+    EXPECT_FALSE(ConstString("x1").scanFloat(value, 0, false));
     EXPECT_TRUE(ConstString(u"tempo 120.25 bpm").scanFloat(value));
     EXPECT_EQ(value, 120.25);
     EXPECT_TRUE(ConstString("3,2,5").scanFloat(value, 2));

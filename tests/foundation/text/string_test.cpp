@@ -253,6 +253,34 @@ TEST(String, HandsItsBufferOver)
     EXPECT_EQ(moved.text(), buffer);
 }
 
+TEST(String, LeavesTheReservedBitAsItWas)
+{
+    struct Marked : String
+    {
+        Marked() { reserved = 1; }
+        bool isMarked() const { return reserved != 0; }
+    };
+    Marked text;
+    String other(u"other");
+    text.assign("narrow").append(u"wide").toMultiByte(kEncodingUtf8);
+    text.swapContent(other);
+    text.take(other);
+    static_cast<String&>(text) = String("moved");
+    text.printf(u"%d", 1).resize(0, false);
+    free(text.pass());
+    EXPECT_TRUE(text.isMarked());
+    EXPECT_EQ(shape(other), "narrow:");
+
+    struct MarkedView : ConstString
+    {
+        MarkedView() { reserved = 1; }
+        bool isMarked() const { return reserved != 0; }
+    };
+    MarkedView view;
+    static_cast<ConstString&>(view) = ConstString(u"view");
+    EXPECT_TRUE(view.isMarked());
+}
+
 TEST(String, ComesFromAndGoesIntoVariants)
 {
     String text;
@@ -286,5 +314,6 @@ TEST(String, SpeaksPascal)
     String longText;
     longText.assign('x', 300).toPascalString(pascal);
     EXPECT_EQ(pascal[0], 255);
+    EXPECT_EQ(pascal[255], 'x');
     EXPECT_EQ(longText.fromPascalString(pascal).length(), 255u);
 }

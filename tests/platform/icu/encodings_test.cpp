@@ -68,6 +68,8 @@ TEST(Encodings, TheDefaultFollowsTheProcess)
     const DefaultEncoding japanese(kEncodingDosJapanese);
     EXPECT_EQ(encoded(u"あ", kEncodingDefault), "\x82\xA0");
     EXPECT_EQ(ConstString("\x82\xA0x").findNext(0, u'x'), 1) << "two bytes are one character";
+    EXPECT_TRUE(ConstString("\x82\xA0") == ConstString(u"あ")) << "equal at different lengths";
+    EXPECT_FALSE(ConstString("\x82\xA0") == ConstString(u"あx"));
 }
 
 TEST(Utf8, RefusesIllFormedBytesOneByOne)

@@ -1,6 +1,6 @@
 #include "services/localisation/ulocale.h"
 
-#include "foundation/text/encodings.h"
+#include "foundation/text/conststring.h"
 
 #include <cstdlib>
 #include <gtest/gtest.h>
@@ -30,12 +30,27 @@ TEST(ULocale, TakesTheSystemsLanguageAndItsEncoding)
     unsetenv("LANGUAGE");
     EXPECT_EQ(systemLanguageUnder("de_DE.UTF-8"), 1);
     EXPECT_EQ(getDefaultEncoding(), kEncodingMacRoman);
-    EXPECT_EQ(systemLanguageUnder("pt_BR.UTF-8"), 49);
     EXPECT_EQ(systemLanguageUnder("ja_JP.UTF-8"), kLanguageJapanese);
     EXPECT_EQ(getDefaultEncoding(), kEncodingDosJapanese);
     EXPECT_EQ(systemLanguageUnder("eo"), kLanguageEnglish);
     EXPECT_EQ(systemLanguageUnder("C"), kLanguageEnglish);
     EXPECT_EQ(getDefaultEncoding(), kEncodingMacRoman);
+
+    // The platform's names of languages are those of the table.
+    for (int i = 0; i < kLanguageCount; ++i)
+    {
+        const std::string ours = gLanguageCodeTable[i];
+        const std::string code = ours == "jp" ? "ja" : ours == "us" ? "en" : ours == "bp" ? "pt_BR" : ours;
+        EXPECT_EQ(systemLanguageUnder((code + ".UTF-8").c_str()), i) << code;
+    }
+}
+
+TEST(ULocale, TheLastKnownLanguageWins)
+{
+    EXPECT_EQ(ULocale::getLastKnownLanguage(u"French\ngerman\nKlingon"), 1);
+    EXPECT_EQ(ULocale::getLastKnownLanguage("\nEnglish\n\nBRAZILIAN PORTUGUESE\n"), 49);
+    EXPECT_EQ(ULocale::getLastKnownLanguage(u"Klingon"), kLanguageEnglish);
+    EXPECT_EQ(ULocale::getLastKnownLanguage(u""), kLanguageEnglish);
 }
 
 TEST(ULocale, EveryRowOfTheTableIsFoundByItsNames)

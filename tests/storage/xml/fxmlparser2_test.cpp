@@ -166,6 +166,13 @@ TEST(FXmlParser2, RefusesWhatWouldTakeTooMuch)
     EXPECT_FALSE(second.process(&deep));
     EXPECT_EQ(errorOf(second), "Xml Error: parsing aborted \r\nLine: 0");
 
+    std::string declarations = "<!DOCTYPE a [";
+    for (int i = 0; i < 200000; i++)
+        declarations += "<!ENTITY e" + std::to_string(i) + " 'x'>";
+    TextStream longProlog(declarations + "]><a/>");
+    FXmlParser2 fourth;
+    EXPECT_FALSE(fourth.process(&longProlog));
+
     TextStream notTooDeep(repeated("<a>", FXmlParser2::kMaxDepth) + repeated("</a>", FXmlParser2::kMaxDepth));
     FXmlParser2 third;
     EXPECT_TRUE(third.process(&notTooDeep));

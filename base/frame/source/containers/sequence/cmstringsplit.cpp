@@ -11,6 +11,7 @@ void addPiece(const IPtr<CmString>& piece, CmContainer& result)
     if (!result.add(piece))
         piece->release();
 }
+
 /// The delimiter in the width of the text where that is possible, so that no search has to convert the text.
 String fitDelimiter(const ConstString& delimiter, const ConstString& text)
 {

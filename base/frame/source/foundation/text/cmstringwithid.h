@@ -2,7 +2,7 @@
 
 #include "foundation/text/cmstring.h"
 
-/// A text with a number of its owner's choice.
+/// A text with a number of its owner's choice. One thread at a time.
 class CmStringWithId : public CmString
 {
     DECLARE_CLASS(CmStringWithId, CmString)

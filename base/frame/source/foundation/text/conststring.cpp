@@ -146,11 +146,13 @@ bool ConstString::extract(String& result, unsigned index, int count) const
 {
     if (index >= len)
         return false;
-    const int taken = static_cast<int>(clampedCount(index, count));
-    if (isWide)
-        result.assign(chars16() + index, taken, false);
-    else
-        result.assign(chars8() + index, taken, false);
+    // Made apart, since `result` may be this very text.
+    const unsigned taken = clampedCount(index, count);
+    const int given = static_cast<int>(taken);
+    String part = isWide ? String(chars16() + index, given, false) : String(chars8() + index, given, false);
+    if (part.length() != taken)
+        return false;
+    result.take(part);
     return true;
 }
 

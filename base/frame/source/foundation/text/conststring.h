@@ -152,7 +152,7 @@ public:
     /// Case-sensitive, of any two widths.
     friend bool operator==(const ConstString& a, const ConstString& b)
     {
-        return a.len == b.len && a.compare(b) == 0;
+        return (a.len == b.len || a.isWide != b.isWide) && a.compare(b) == 0;
     }
     friend bool operator<(const ConstString& a, const ConstString& b) { return a.compare(b) < 0; }
 

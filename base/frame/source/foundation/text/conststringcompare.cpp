@@ -13,11 +13,10 @@ namespace
 class WideText
 {
 public:
-    explicit WideText(const ConstString& text) : copy(text.isWideString() ? ConstString() : text)
+    explicit WideText(const ConstString& text) : view(text)
     {
-        copy.toWideString();
-        view = text.isWideString() ? ConstString(text.isEmpty() ? kEmptyString16 : text.text16())
-                                   : ConstString(copy.text16());
+        if (!text.isWideString())
+            view = copy.assign(text).text16();
     }
 
     const ConstString& get() const { return view; }
@@ -141,6 +140,7 @@ int searchInOneWidth(const ConstString& text, const ConstString& what, int count
     const WideText wideText(text), wideWhat(what);
     return search(wideView(wideText.get()), wideView(wideWhat.get()).substr(0, limit));
 }
+
 int countInOneWidth(const ConstString& text, const ConstString& character, unsigned start, CompareMode mode)
 {
     const int found = searchInOneWidth(
@@ -222,6 +222,8 @@ int ConstString::findPrev(int start, const ConstString& text, int count, Compare
 
 int ConstString::findNext(int start, char character, CompareMode mode, int end) const
 {
+    if (isWide)
+        return findNext(start, widenCharacter(character), mode, end);
     const char text[] = {character, 0};
     return findNext(start, ConstString(text), 1, mode, end);
 }
@@ -234,6 +236,8 @@ int ConstString::findNext(int start, char16 character, CompareMode mode, int end
 
 int ConstString::findPrev(int start, char character, CompareMode mode) const
 {
+    if (isWide)
+        return findPrev(start, widenCharacter(character), mode);
     const char text[] = {character, 0};
     return findPrev(start, ConstString(text), 1, mode);
 }
@@ -246,6 +250,8 @@ int ConstString::findPrev(int start, char16 character, CompareMode mode) const
 
 int ConstString::countOccurences(char character, unsigned start, CompareMode mode) const
 {
+    if (isWide)
+        return countOccurences(widenCharacter(character), start, mode);
     const char text[] = {character, 0};
     return countInOneWidth(*this, ConstString(text), start, mode);
 }

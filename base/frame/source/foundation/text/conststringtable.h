@@ -8,7 +8,7 @@
 ///
 /// Texts are found by the address of the literal, never by its characters: two equal literals at different
 /// addresses have an entry each, and what is given must live forever. A byte above 127 is widened by its sign
-/// (0xFF gives 0xFFFF): the table is meant for ASCII. It works during static start-up. Not synchronised: other
+/// (0xFF gives 0xFFFF): the table is meant for ASCII. It works during static start-up. One thread at a time: other
 /// threads ask only for literals that were entered already.
 class ConstStringTable
 {

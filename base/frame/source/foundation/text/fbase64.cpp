@@ -31,6 +31,8 @@ bool hasGoodPadding(const ConstString& text)
     const auto padding = text.length() - static_cast<unsigned>(first);
     return padding == 1 || (padding == 2 && text.testChar8(text.length() - 1, '='));
 }
+
+/// Writes the bytes and a terminator; `out` has room for three quarters of the text and one byte.
 bool decodeTo(char* out, const char* in)
 {
     unsigned bits = 0;

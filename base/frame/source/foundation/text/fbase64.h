@@ -2,7 +2,7 @@
 
 class FString;
 
-/// Base64 with the standard alphabet and "=" at the end, in place, for 7-bit text only.
+/// Base64 with the standard alphabet and "=" at the end, in place, for 7-bit text only. Thread-safe.
 class FBase64
 {
 public:

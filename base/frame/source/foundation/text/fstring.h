@@ -9,6 +9,7 @@ class FStream;
 ///
 /// The form: the number of bytes that follow, 4 bytes in the stream's order; then the bytes of a narrow text with
 /// its zero, or UTF-8, a zero and the marker EF BB BF of a wide one. An empty text is the number 0 alone.
+/// One thread at a time.
 class FString : public String
 {
 public:
@@ -29,7 +30,7 @@ public:
     static bool storeString16(FStream& stream, const char16* text, int count = -1);
 };
 
-/// A text that is a whole path, to tell it from a name.
+/// A text that is a whole path, to tell it from a name. One thread at a time.
 class FFullPathString : public FString
 {
 public:

@@ -216,10 +216,8 @@ bool String::toWideString(unsigned encoding)
 
 bool String::toMultiByte(unsigned encoding)
 {
-    if (!isWide && encoding == kEncodingDefault)
-        return true;
-    if (!toWideString())
-        return false;
+    if (!isWide)
+        return encoding == kEncodingDefault || recode(encoding);
     if (isEmpty())
         return resize(0, false);
     unsigned newLength = 0;
@@ -227,6 +225,16 @@ bool String::toMultiByte(unsigned encoding)
     if (narrow)
         take(narrow, false);
     return narrow != nullptr;
+}
+
+bool String::recode(unsigned encoding)
+{
+    // In a copy, so that a failure of the second step leaves the text as it was.
+    String copy(*this);
+    if (!copy.toWideString() || !copy.toMultiByte(encoding))
+        return false;
+    take(copy);
+    return true;
 }
 
 bool String::fromUTF8(const char* text)
@@ -327,11 +335,11 @@ bool String::fromAttributes(IAttributes* attributes, const char* id)
 
 void String::toPascalString(unsigned char* result) const
 {
-    String copy(*this);
-    const char* narrow = copy.text8();
-    const unsigned count = std::min(copy.length(), 255u);
+    const String copy(*this);
+    const ConstString narrow(copy.text8());
+    const unsigned count = std::min(narrow.length(), 255u);
     result[0] = static_cast<unsigned char>(count);
-    std::memcpy(result + 1, narrow, count);
+    std::memcpy(result + 1, narrow.text8(), count);
 }
 
 String& String::fromPascalString(const unsigned char* text)

@@ -80,8 +80,16 @@ public:
     /// Past the end the text grows by spaces; a zero character ends the text there.
     bool setChar8(unsigned index, char character);
     bool setChar16(unsigned index, char16 character);
-    /// See the class `ConstString` for the end of a text in digits. Adds one to it, or begins one, separated by
-    /// `separator`, with at least `width` digits and at least `minNumber`. False for a width above 32.
+    /// Adds one to the number at the end, or begins one with 1. It gets at least `width` digits, is at least
+    /// `minNumber`, and stands behind `separator` unless that is 0 or nothing else is there.
+    ///
+    ///     text     width  separator  minNumber  result
+    ///     Take 9   0      ' '        0          Take 10
+    ///     Take     0      ' '        2          Take 2
+    ///     Take     3      ' '        2          Take 002
+    ///     Take     0      0          0          Take1
+    ///
+    /// False, with the text as it was, for a width above 32.
     bool incrementTrailingNumber(unsigned width = 0, char16 separator = 0, unsigned minNumber = 0);
 
     // Width, case and form
@@ -139,6 +147,8 @@ private:
     char* chars8() { return chars<char>(); }
     char16* chars16() { return chars<char16>(); }
 
+    /// Brings a narrow text from the default encoding into another one.
+    bool recode(unsigned encoding);
     bool owns(const void* text) const;
     void terminate(unsigned index);
     void fillWith(char character, unsigned index, unsigned count);

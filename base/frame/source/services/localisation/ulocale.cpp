@@ -30,20 +30,26 @@ ULanguage ULocale::getSystemLanguage()
 
     String names;
     ITextServices::instance().getPreferredLanguages(names);
-    // Each name that is known takes the place of the one before it: the last one wins.
-    for (int start = 0; start < static_cast<int>(names.length());)
-    {
-        const int lineEnd = names.findNext(start, u'\n');
-        const int end = lineEnd < 0 ? static_cast<int>(names.length()) : lineEnd;
-        String name;
-        names.extract(name, static_cast<unsigned>(start), end - start);
-        if (const int language = findLanguage(name, kCaseInsensitive); language != kLanguageNone)
-            systemLanguage = language;
-        start = end + 1;
-    }
+    systemLanguage = getLastKnownLanguage(names);
     setDefaultEncoding(systemLanguage == kLanguageJapanese ? kEncodingDosJapanese : kEncodingDefault);
     systemLanguageKnown = true;
     return systemLanguage;
+}
+
+ULanguage ULocale::getLastKnownLanguage(const ConstString& names)
+{
+    ULanguage result = kLanguageEnglish;
+    for (unsigned start = 0; start < names.length();)
+    {
+        const int lineEnd = names.findNext(static_cast<int>(start), u'\n');
+        const unsigned end = lineEnd < 0 ? names.length() : static_cast<unsigned>(lineEnd);
+        String name;
+        names.extract(name, start, static_cast<int>(end - start));
+        if (const int language = findLanguage(name, kCaseInsensitive); language != kLanguageNone)
+            result = language;
+        start = end + 1;
+    }
+    return result;
 }
 
 ULanguage ULocale::getUserLanguage()

@@ -2,6 +2,8 @@
 
 #include "foundation/object/types.h"
 
+class ConstString;
+
 /// Index of a language in the table of the system: 0 is English.
 using ULanguage = int;
 
@@ -18,11 +20,13 @@ extern const char* const gLanguageCodeTable[kLanguageCount];
 /// What the process knows of languages: the system's, the user's choice, and where double bytes begin.
 ///
 /// One object a process, by `__getLocale`. *Main thread*: the first question for the system's language asks the
-/// platform, and settles the default encoding.
+/// platform, and settles the default encoding of 8-bit text.
 class ULocale
 {
 public:
     ULanguage getSystemLanguage();
+    /// The last of the names, separated by line feeds, that the table has in any case; English without one.
+    static ULanguage getLastKnownLanguage(const ConstString& names);
     /// What was set, else the system's.
     ULanguage getUserLanguage();
     void setUserLanguage(ULanguage language);

@@ -23,6 +23,7 @@ struct FXmlParser2::Callbacks
     static void XMLCALL startElement(void* userData, const char* name, const char** attributes)
     {
         FXmlParser2& self = parserOf(userData);
+        self.begun = true;
         if (++self.depth > kMaxDepth)
             return self.stop();
         if (self.handler)
@@ -108,7 +109,7 @@ FXmlParser2::Outcome FXmlParser2::parseBlock(IBStream& stream)
     const Outcome outcome = judge(XML_ParseBuffer(parser, count, count == 0), stream);
     if (outcome != Outcome::kMore)
         return outcome;
-    refused = isTokenTooLong();
+    refused = isTooLong();
     if (refused)
         return Outcome::kFailed;
     return count == 0 ? Outcome::kDone : Outcome::kMore;
@@ -128,12 +129,12 @@ FXmlParser2::Outcome FXmlParser2::judge(int status, IBStream& stream)
 }
 
 // While a token is incomplete expat may put off looking at it, and then tells no place: it is where it was.
-bool FXmlParser2::isTokenTooLong()
+bool FXmlParser2::isTooLong()
 {
     const int64 place = XML_GetCurrentByteIndex(parser);
     if (place >= 0)
         tokenStart = place;
-    return bytesFed - tokenStart > kMaxTokenBytes;
+    return bytesFed - tokenStart > kMaxTokenBytes || (!begun && bytesFed > kMaxPrologBytes);
 }
 
 void FXmlParser2::stop()
@@ -169,6 +170,7 @@ bool FXmlParser2::reset(const char* encoding)
     bytesFed = 0;
     tokenStart = 0;
     depth = 0;
+    begun = false;
     refused = false;
     return true;
 }

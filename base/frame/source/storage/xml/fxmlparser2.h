@@ -9,9 +9,9 @@ struct XML_ParserStruct;
 
 /// The newer parser: reads a stream in blocks and tells its handler of elements, text and comments.
 ///
-/// A document nested deeper than `kMaxDepth` or with one tag, comment or the like longer than `kMaxTokenBytes` is
-/// refused like one that a handler stopped: the first bounds memory, the second the time, since a token that spans
-/// many blocks is looked at anew with each. One thread at a time.
+/// Refused, like a document that a handler stopped, is one that is nested deeper than `kMaxDepth`, that has more than
+/// `kMaxPrologBytes` of declarations in front of its root, or one tag, comment or the like longer than
+/// `kMaxTokenBytes`: no input may take memory or time out of all proportion. One thread at a time.
 class FXmlParser2 : public FObject, public INewXmlParser
 {
     DECLARE_TYPE(FXmlParser2, FObject)
@@ -36,6 +36,7 @@ class FXmlParser2 : public FObject, public INewXmlParser
 
     static constexpr int kMaxDepth = 5000;
     static constexpr int64 kMaxTokenBytes = 1 << 20;
+    static constexpr int64 kMaxPrologBytes = 1 << 20;
 
 private:
     struct Callbacks;
@@ -50,7 +51,7 @@ private:
     void install();
     Outcome parseBlock(IBStream& stream);
     Outcome judge(int status, IBStream& stream);
-    bool isTokenTooLong();
+    bool isTooLong();
     int errorCode() const;
 
     XML_ParserStruct* parser;
@@ -60,6 +61,7 @@ private:
     int64 bytesFed = 0;
     int64 tokenStart = 0;
     int depth = 0;
-    /// A token was too long.
+    /// Whether the root has begun.
+    bool begun = false;
     bool refused = false;
 };

@@ -1,69 +1,24 @@
 #include "storage/xml/xmltext.h"
 
 #include "containers/value/buffer.h"
-#include "foundation/text/itextservices.h"
+#include "foundation/text/utf8.h"
 
 #include <algorithm>
 #include <cstdlib>
 #include <cstring>
 
-namespace
-{
-bool isAscii(const char* text, size_t length)
-{
-    unsigned char bits = 0;
-    for (size_t i = 0; i < length; i++)
-        bits |= static_cast<unsigned char>(text[i]);
-    return bits < 0x80;
-}
-
-size_t runLength(std::u16string_view text, bool ascii)
-{
-    size_t length = 0;
-    while (length < text.size() && (text[length] < 0x80) == ascii)
-        length++;
-    return length;
-}
-
-void appendAscii(Buffer& out, const char16* text, size_t length)
-{
-    char piece[256];
-    for (size_t done = 0; done < length;)
-    {
-        const size_t count = std::min(length - done, sizeof(piece));
-        for (size_t i = 0; i < count; i++)
-            piece[i] = static_cast<char>(text[done + i]);
-        out.put(piece, static_cast<uint32>(count));
-        done += count;
-    }
-}
-
-void appendConverted(Buffer& out, const char16* text, size_t length)
-{
-    unsigned bytes = 0;
-    char* converted =
-        ITextServices::instance().toMultiByte(text, static_cast<unsigned>(length), kEncodingUtf8, '?', bytes);
-    if (converted)
-        out.put(converted, bytes);
-    free(converted);
-}
-} // namespace
-
 namespace Xml
 {
 void assignUtf8(String& target, const char* text, size_t length)
 {
-    char16* wide =
-        isAscii(text, length) ? static_cast<char16*>(malloc((length + 1) * sizeof(char16))) : nullptr;
+    auto* wide = static_cast<char16*>(malloc((length + 1) * sizeof(char16)));
     if (!wide)
-    {
-        target.assign(text, static_cast<int>(length), false);
-        target.toWideString(kEncodingUtf8);
         return;
-    }
-    for (size_t i = 0; i < length; i++)
-        wide[i] = static_cast<char16>(text[i]);
-    wide[length] = 0;
+    const size_t count = decodeUtf8(text, static_cast<unsigned>(length), wide, ' ');
+    wide[count] = 0;
+    if (count < length)
+        if (void* fitting = realloc(wide, (count + 1) * sizeof(char16)))
+            wide = static_cast<char16*>(fitting);
     target.take(wide, true);
 }
 
@@ -79,16 +34,11 @@ bool isXmlSpace(const char* text, size_t length)
 
 void appendUtf8(Buffer& out, std::u16string_view text)
 {
-    while (!text.empty())
-    {
-        const bool ascii = text[0] < 0x80;
-        const size_t length = runLength(text, ascii);
-        if (ascii)
-            appendAscii(out, text.data(), length);
-        else
-            appendConverted(out, text.data(), length);
-        text.remove_prefix(length);
-    }
+    constexpr size_t kMostBytes = 3;
+    const uint32 before = out.getFillSize();
+    const auto length = static_cast<uint32>(text.size());
+    if (out.grow(before + length * static_cast<uint32>(kMostBytes)))
+        out.setFillSize(before + encodeUtf8(text.data(), length, out + before, '?'));
 }
 
 void appendText(Buffer& out, const char* text)

@@ -8,7 +8,7 @@ class Buffer;
 
 namespace Xml
 {
-/// Gives `target` the wide text of `length` bytes in UTF-8; plain ASCII, by far the most, skips the converter.
+/// Gives `target` the wide text of `length` bytes in UTF-8, with a blank for each byte that means nothing.
 void assignUtf8(String& target, const char* text, size_t length);
 void assignUtf8(String& target, const char* text);
 
