@@ -28,7 +28,9 @@ class StoredNode : public CmObject
     }
     bool restoreAttributes(FAttributes& attributes) override
     {
-        next = attributes.getObject("Next", "StoredNode");
+        // Damaged bytes can name the node itself; such a ring would never be released.
+        CmObject* stored = attributes.getObject("Next", "StoredNode");
+        next = stored != this ? stored : nullptr;
         return attributes.get("Number", number);
     }
     bool externalize(FArchive& archive) const override
