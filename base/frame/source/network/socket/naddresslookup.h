@@ -8,7 +8,7 @@ class CmContainer;
 class NSocket;
 class String;
 
-/// Names and addresses of hosts. Thread-safe.
+/// Names and addresses of hosts. *Thread-safe*.
 class NAddressLookup
 {
 public:
@@ -16,18 +16,21 @@ public:
     /// loopback interface only with `withLoopback`. Returns how many were added.
     static int getLocalAddresses(CmContainer& result, bool withLoopback = false);
     static bool isLocalAddress(const NAddress& address);
+    /// The first address that other hosts know; that of the loopback interface where there is none.
+    static NAddress getLocalAddress();
     /// Where datagrams to everyone go: one address for each local network.
     static std::vector<NAddress> getBroadcastAddresses();
     /// The name of this host; false, and an empty text, where it has none.
     static bool getLocalHostName(String& name);
 
-    // The rest asks other hosts, which may take many seconds.
+    // What asks other hosts, which may take many seconds. It is given up after `timeout` milliseconds (-1 is without
+    // limit), or soon after `canceller`, which may be null, is stopped
 
-    /// An address in numbers, or the addresses of a name, in the order to try them; empty where it is not found.
-    static std::vector<NAddress> findHost(const char* host);
-    /// As above, but gives up after `timeout` milliseconds (-1 is without limit) or when `canceller`, which may be
-    /// null, is stopped.
-    static std::vector<NAddress> findHost(const char* host, int timeout, NSocket* canceller);
-    /// The name of a host; false where it has none.
-    static bool findName(const NAddress& address, String& name);
+    /// An address in numbers, which takes no asking, or the addresses of a name in the order to try them. Empty where
+    /// there are none.
+    static std::vector<NAddress> findHost(const char* host, int timeout = -1,
+                                          const NSocket* canceller = nullptr);
+    /// The name of a host; false where it isn't known.
+    static bool findName(const NAddress& address, String& name, int timeout = -1,
+                         const NSocket* canceller = nullptr);
 };

@@ -55,6 +55,8 @@ public:
 
     /// Makes the system's socket; true also where there is one. The operations that need one call it.
     bool create();
+    /// Closes the system's socket; a stop stays.
+    void disconnect();
     /// Closes the system's socket and forgets a stop, so that the object can be used again.
     void endSocket();
     /// Ends whatever operation waits, and every later one, until `endSocket`. Any thread.
@@ -78,9 +80,9 @@ public:
     /// `backlog` connections wait for `accept`.
     bool listen(int backlog);
     /// The next connection, in blocking mode after waiting for it; null where none came. `address` takes its four
-    /// bytes, with `size` as the room and then what was taken; both may be null. `nonBlocking` is the mode of the
-    /// new socket.
-    std::unique_ptr<NSocket> accept(void* address, int* size, bool nonBlocking);
+    /// bytes, with `size` as the room and then what was taken; both may be null. `nonBlockingResult` is the
+    /// mode of the new socket.
+    std::unique_ptr<NSocket> accept(void* address, int* size, bool nonBlockingResult);
     /// Connects within this many milliseconds, -1 for no limit. For datagrams it sets whom they go to and come from.
     bool connect(const NAddress& address, uint16 port, int timeout);
 
@@ -120,7 +122,9 @@ private:
     friend class NSocketPoll;
 
     NSocket(Type socketType, int connectedHandle);
-    bool awaitTurn(PendingQuery query);
+    static bool tell(const NAddress& found, uint16 foundPort, void* address, uint16* port);
+    template <class Step>
+    int transfer(PendingQuery query, Step step);
 
     Type type;
     std::atomic<State> state{kNotCreated};

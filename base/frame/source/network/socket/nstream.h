@@ -18,8 +18,8 @@ class NStream : public FStream
     DECLARE_TYPE(NStream, FStream)
 
     NStream();
-    /// Takes over a connected socket, as an accepted one.
-    explicit NStream(std::unique_ptr<NSocket> connected);
+    /// Takes over a socket, as an accepted one.
+    explicit NStream(std::unique_ptr<NSocket> ownSocket);
     NStream(const NStream&) = delete;
     NStream& operator=(const NStream&) = delete;
     ~NStream() override;
@@ -33,7 +33,7 @@ class NStream : public FStream
     /// Ends the operation that waits, if any, and lets all later ones fail until `close`. Any thread.
     virtual void cancel();
 
-    bool isOpen() const { return socket->getState() == NSocket::kConnected; }
+    bool isOpen() const { return socket->isCreated(); }
     bool isCancelled() const { return socket->isStopped(); }
     /// Never null.
     NSocket* getSocket() const { return socket.get(); }
@@ -56,8 +56,6 @@ class NStream : public FStream
     using FStream::tell;
 
 protected:
-    NStream(std::unique_ptr<NSocket> ownSocket, bool isConnected);
-
     // What goes between the bytes of the stream and the socket, for a class that encrypts them. The base hands them
     // on to the socket; the calls wait.
 
@@ -75,7 +73,7 @@ protected:
 
 private:
     int64 takeBuffered(char* data, int64 count);
-    int fillBuffer();
+    int64 readSome(char* data, int64 count);
 
     bool failed = false;
     int64 bytesRead = 0;

@@ -1,0 +1,19 @@
+#include "network/socket/nsocketpoll.h"
+
+int NSocketPoll::add(const NSocket& socket, PendingQuery query)
+{
+    sockets.push_back({socket.handle, query, false});
+    wakeHandles.push_back(socket.wakeHandle);
+    return static_cast<int>(sockets.size()) - 1;
+}
+
+bool NSocketPoll::wait(int timeout)
+{
+    return PlatformSocket::wait(sockets, wakeHandles, timeout);
+}
+
+void NSocketPoll::clear()
+{
+    sockets.clear();
+    wakeHandles.clear();
+}
