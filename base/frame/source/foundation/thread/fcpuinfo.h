@@ -2,7 +2,7 @@
 
 #include "foundation/object/types.h"
 
-/// How many processors there are, as read when the object was made. A value.
+/// How many processors there are, as read when the object was made. One thread at a time.
 class FCpuInfo
 {
 public:

@@ -40,8 +40,8 @@ protected:
 ///
 /// One object runs one thread at a time, and can be run again after `entry` has returned. Whoever runs it waits for
 /// its end by `waitDead` before deleting it; an object that is deleted earlier leaves its thread to itself.
-/// Everything belongs to one owner, but that any thread may ask `isThreadRunning`, and the thread itself may ask
-/// and set what concerns it.
+/// One thread at a time: that of the owner, but that any thread may ask `isThreadRunning`, and the thread itself may
+/// ask and set what concerns it.
 class FThread
 {
 public:

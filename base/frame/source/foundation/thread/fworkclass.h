@@ -1,6 +1,7 @@
 #pragma once
 
-/// A unit of work for a worker thread.
+/// A unit of work for a worker thread. Made by whoever needs the work; then it belongs to the worker. Thread-safe as to
+/// `cancelWork`; the rest is called by one thread at a time.
 class FWorkClass
 {
 public:

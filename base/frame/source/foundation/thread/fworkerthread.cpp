@@ -2,13 +2,10 @@
 
 #include "foundation/thread/flockscope.h"
 
-#include <memory>
-
 FWorkerThread* gWorkerThread = nullptr;
 
 FWorkerThread::FWorkerThread(const char* threadName, FThreadPriority level)
-    : FThread(threadName ? threadName : "WorkerThread"),
-      requestedPriority(level)
+    : FQueueWorker(threadName ? threadName : "WorkerThread", level, workAvailable, resumed)
 {
     if (!gWorkerThread)
         gWorkerThread = this;
@@ -18,80 +15,30 @@ FWorkerThread::~FWorkerThread()
 {
     if (gWorkerThread == this)
         gWorkerThread = nullptr;
-    if (endedByItself && isInThreadContext())
-        *endedByItself = true;
 }
 
-int FWorkerThread::entry()
+FQueueWorker::Record* FWorkerThread::removeFirst(CmObject*&)
 {
-    bool isGone = false;
-    endedByItself = &isGone;
-    while (!terminating)
-    {
-        waitWhileSuspended();
-        if (Record* record = takeNext())
-        {
-            FWorkClass* work = record->work;
-            work->performThreadWork(record->data);
-            if (isGone)
-                return 0;
-            finishCurrent();
-            waitWhileSuspended();
-        }
-        else if (!terminating)
-            workAvailable.wait();
-    }
-    endedByItself = nullptr;
-    return 0;
-}
-
-void FWorkerThread::waitWhileSuspended()
-{
-    while (suspended && !terminating)
-        resumed.wait();
-}
-
-FWorkerThread::Record* FWorkerThread::takeNext()
-{
-    FLockScope guard(queue.guard());
-    current = static_cast<Record*>(queue.removeFirst());
-    return current;
-}
-
-void FWorkerThread::finishCurrent()
-{
-    FLockScope guard(queue.guard());
-    if (!current)
-        return;
-    current->work->finished();
-    delete current;
-    current = nullptr;
+    return static_cast<Record*>(queue.removeFirst());
 }
 
 bool FWorkerThread::addWork(FWorkClass* work, void* data)
 {
-    enqueue(new Record{work, data}, false);
+    queue.append(new Record{work, data});
+    startWork();
     return true;
 }
 
 bool FWorkerThread::prependWork(FWorkClass* work, void* data)
 {
-    enqueue(new Record{work, data}, true);
+    queue.prepend(new Record{work, data});
+    startWork();
     return true;
 }
 
-void FWorkerThread::enqueue(Record* record, bool first)
+void FWorkerThread::startWork()
 {
-    if (first)
-        queue.prepend(record);
-    else
-        queue.append(record);
-
-    if (notStarted.exchange(false))
-    {
-        run();
-        setPriority(requestedPriority);
-    }
+    startOnce();
     workAvailable.signalAll();
 }
 
@@ -101,57 +48,12 @@ void FWorkerThread::cancelCurrent(bool discard)
     if (!current)
         return;
 
-    current->work->cancelWork();
+    cancelRunning();
     if (discard)
     {
-        current->work->finished();
-        delete current;
-    }
-    else
-        queue.prepend(current);
-    current = nullptr;
-}
-
-void FWorkerThread::suspend()
-{
-    if (suspended)
-        return;
-    resumed.reset();
-    suspended = true;
-}
-
-void FWorkerThread::resume()
-{
-    if (!suspended)
-        return;
-    suspended = false;
-    resumed.signalAll();
-}
-
-void FWorkerThread::cancelAll()
-{
-    FLockScope guard(queue.guard());
-    if (current)
-        current->work->cancelWork();
-    while (void* item = queue.removeFirst())
-    {
-        const std::unique_ptr<Record> record(static_cast<Record*>(item));
-        record->work->cancelWork();
-        record->work->finished();
-    }
-}
-
-void FWorkerThread::end()
-{
-    terminating = true;
-    suspended = false;
-    cancelAll();
-    workAvailable.signalAll();
-    resumed.signalAll();
-    if (!waitDead(1000))
-    {
         finishCurrent();
-        terminate();
+        return;
     }
-    delete this;
+    queue.prepend(current);
+    current = nullptr;
 }

@@ -2,11 +2,10 @@
 
 #include "foundation/object/fobject.h"
 
-/// Hears the ticks of a timer.
+/// Hears the ticks of a timer. Main thread.
 class ITimerCallback
 {
 public:
-    /// On the main thread.
     virtual void onTimer() = 0;
 
 protected:

@@ -2,7 +2,7 @@
 
 class FWorkClass;
 
-/// A thread that works off a queue.
+/// A thread that works off a queue. Thread-safe; `end` once.
 class IWorkerThread
 {
 public:
