@@ -3,11 +3,14 @@
 
 #include <gtest/gtest.h>
 
+#include <pthread.h>
+#include <sched.h>
 #include <sys/resource.h>
 #include <sys/syscall.h>
 #include <unistd.h>
 
 #include <functional>
+#include <iterator>
 #include <string>
 #include <vector>
 
@@ -32,14 +35,23 @@ int nicenessOfCaller()
     return getpriority(PRIO_PROCESS, static_cast<id_t>(syscall(SYS_gettid)));
 }
 
-int nicenessAtLevel(int level)
+/// How far the caller goes before others: round robin before all time sharing, a low niceness before a high one.
+int rankOfCaller()
 {
-    int niceness = 0;
-    Task task([&] { niceness = nicenessOfCaller(); });
+    int policy = 0;
+    sched_param parameters{};
+    pthread_getschedparam(pthread_self(), &policy, &parameters);
+    return policy == SCHED_RR ? 100 + parameters.sched_priority : -nicenessOfCaller();
+}
+
+int rankAtLevel(int level)
+{
+    int rank = 0;
+    Task task([&] { rank = rankOfCaller(); });
     task.setPriority(level);
     EXPECT_EQ(task.run(), 0);
     EXPECT_TRUE(task.waitDead(-1));
-    return niceness;
+    return rank;
 }
 } // namespace
 
@@ -106,15 +118,62 @@ TEST(FThread, WaitDeadIgnoresItsTimeLimit)
 
 TEST(FThread, WorksAtItsPriorityFromTheStart)
 {
-    const int lowest = nicenessAtLevel(0);
-    const int low = nicenessAtLevel(1);
-    const int normal = nicenessAtLevel(2);
-    EXPECT_EQ(normal, nicenessOfCaller());
-    EXPECT_GE(lowest, low);
-    EXPECT_GE(low, normal);
-    EXPECT_GT(lowest, normal);
-    EXPECT_EQ(nicenessAtLevel(7), lowest) << "what is no level is the lowest one";
-    EXPECT_EQ(nicenessAtLevel(-1), lowest);
+    const int lowest = rankAtLevel(0);
+    int below = lowest;
+    for (int level = 1; level <= 5; level++)
+    {
+        const int rank = rankAtLevel(level);
+        // What the system refuses may make neighbours equal, but never turns them around.
+        EXPECT_GE(rank, below) << level;
+        EXPECT_TRUE(rank > below || rank < 100) << "where round robin is permitted, each level has its own";
+        below = rank;
+    }
+    EXPECT_EQ(rankAtLevel(2), rankOfCaller());
+    EXPECT_LT(lowest, rankAtLevel(2)) << "going down is always permitted";
+    EXPECT_EQ(rankAtLevel(7), lowest) << "what is no level is the lowest one";
+    EXPECT_EQ(rankAtLevel(-1), lowest);
+}
+
+TEST(FThread, ChangesThePriorityOfARunningThread)
+{
+    FCondition hasLooked, mayLook;
+    std::vector<int> ranks;
+    Task task(
+        [&]
+        {
+            for (int i = 0; i < 2; i++)
+            {
+                mayLook.wait();
+                ranks.push_back(rankOfCaller());
+                hasLooked.signal();
+            }
+        });
+    task.setPriority(5);
+    task.run();
+    const int expected[] = {rankAtLevel(5), rankAtLevel(1)};
+    mayLook.signal();
+    hasLooked.wait();
+    EXPECT_TRUE(task.setPriority(1));
+    mayLook.signal();
+    task.waitDead(-1);
+    EXPECT_EQ(ranks, std::vector<int>(std::begin(expected), std::end(expected)));
+}
+
+TEST(FThread, NamesItselfForDebuggers)
+{
+    struct Named : FThread
+    {
+        using FThread::FThread;
+        int entry() override { return pthread_getname_np(pthread_self(), found, sizeof found); }
+        char found[16] = {};
+    } brief("brief"), lengthy("a name that is too long");
+    for (Named* thread : {&brief, &lengthy})
+    {
+        thread->run();
+        thread->waitDead(-1);
+    }
+    EXPECT_STREQ(brief.found, "brief");
+    EXPECT_STREQ(lengthy.found, "a name that is ") << "as much of it as the system takes";
 }
 
 TEST(FThread, PriorityIsKeptForAThreadThatDoesNotExistYet)
@@ -163,16 +222,22 @@ TEST(FThread, ACancelledWaitLeavesTheConditionUsable)
     EXPECT_FALSE(condition.waitTimeout(0)) << "the cancelled thread must not count as waiting";
 }
 
-TEST(FThread, MayDeleteItsOwnObject)
+TEST(FThread, ThatDeletesItsOwnObjectEndsAtItsNextWait)
 {
     struct Suicide : FThread
     {
+        struct LastWords
+        {
+            ~LastWords() { gone.signal(); }
+            FCondition& gone;
+        };
+
         explicit Suicide(FCondition& toSignal) : FThread("suicide"), gone(toSignal) {}
         int entry() override
         {
-            FCondition& signalled = gone;
+            const LastWords lastWords{gone};
             delete this;
-            signalled.signal();
+            FThreadSleep(-1);
             return 0;
         }
 

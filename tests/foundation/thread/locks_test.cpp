@@ -3,6 +3,7 @@
 #include "foundation/thread/flockscope.h"
 #include "foundation/thread/frwlock.h"
 #include "foundation/thread/fsemaphore.h"
+#include "foundation/thread/fthread.h"
 
 #include <gtest/gtest.h>
 
@@ -34,7 +35,7 @@ TEST(FCondition, SignalSticksUntilItIsUsedOrReset)
     EXPECT_FALSE(condition.waitTimeout(0));
     condition.signal();
     condition.signal();
-    condition.wait();
+    EXPECT_TRUE(condition.waitTimeout(-1)) << "no limit";
     EXPECT_FALSE(condition.waitTimeout(1)) << "two signals with nobody waiting are one";
     condition.signalAll();
     condition.reset();
@@ -43,23 +44,34 @@ TEST(FCondition, SignalSticksUntilItIsUsedOrReset)
 
 TEST(FCondition, SignalAllLetsAllGoAndLeavesNothing)
 {
-    FCondition condition;
-    std::atomic<int> passed{0};
-    std::vector<std::thread> waiters;
-    for (int i = 0; i < 2; i++)
-        waiters.emplace_back(
-            [&]
-            {
-                condition.wait();
-                passed++;
-            });
-    // Whoever comes late is let go by the next signal.
-    while (passed < 2)
+    // A round counts if one signal sufficed: a waiter that comes late has to be let go by another one, which may stick.
+    bool wasClean = false;
+    while (!wasClean)
+    {
+        FCondition condition;
+        FSemaphore passed(0, "passed");
+        const auto body = [&]
+        {
+            condition.wait();
+            passed.release(1);
+        };
+        std::thread first(body), second(body);
+        FThreadSleep(20);
         condition.signalAll();
-    for (std::thread& waiter : waiters)
-        waiter.join();
-    condition.reset();
-    EXPECT_FALSE(condition.waitTimeout(0));
+        int count = 0;
+        wasClean = true;
+        while (count < 2)
+            if (passed.acquire(500))
+                count++;
+            else
+            {
+                wasClean = false;
+                condition.signalAll();
+            }
+        first.join();
+        second.join();
+        EXPECT_TRUE(!wasClean || !condition.waitTimeout(0)) << "the last one leaves no signal behind";
+    }
 }
 
 TEST(FCondition, SignalLetsOneOfTwoGo)
@@ -137,6 +149,30 @@ TEST(FRwLock, TheWriterMayReadAndWriteAgain)
     EXPECT_TRUE(lock.verify());
     lock.doneReading();
     EXPECT_FALSE(lock.verify());
+}
+
+TEST(FRwLock, AReaderThatWantsToWriteWaitsForItself)
+{
+    struct Reader : FThread
+    {
+        Reader() : FThread("reader") {}
+        int entry() override
+        {
+            lock.waitToRead();
+            reads.signal();
+            lock.waitToWrite();
+            hasWritten = true;
+            return 0;
+        }
+        FRwLock lock{"rw"};
+        FCondition reads;
+        std::atomic<bool> hasWritten{false};
+    } reader;
+    reader.run();
+    reader.reads.wait();
+    reader.terminate();
+    EXPECT_TRUE(reader.waitDead(-1));
+    EXPECT_FALSE(reader.hasWritten);
 }
 
 TEST(FRwLock, WritersExcludeEverybodyAndNobodyIsForgotten)

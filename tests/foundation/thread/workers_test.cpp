@@ -96,7 +96,7 @@ TEST(FWorkerThread, WorksInOrderAndPrependedFirst)
 {
     Log log;
     FCondition started, mayEnd, done;
-    auto* worker = new FWorkerThread(nullptr, kThreadPriorityNormal);
+    auto* worker = new FWorkerThread(nullptr, kThreadPriorityLow);
     EXPECT_EQ(gWorkerThread, worker) << "the first one is known to all";
     EXPECT_STREQ(worker->getName().text8(), "WorkerThread");
     EXPECT_FALSE(worker->isThreadRunning()) << "there is no work yet";
@@ -104,6 +104,10 @@ TEST(FWorkerThread, WorksInOrderAndPrependedFirst)
     int data = 0;
     worker->addWork(new Work(log, "a", &started, &mayEnd), nullptr);
     started.wait();
+    EXPECT_EQ(worker->getPriority(), kThreadPriorityLow);
+    auto* second = new FWorkerThread("second", kThreadPriorityNormal);
+    EXPECT_EQ(gWorkerThread, worker);
+    second->end();
     worker->addWork(new Work(log, "b"), &data);
     worker->addWork(new LastWork(done), nullptr);
     worker->prependWork(new Work(log, "c"), nullptr);
@@ -215,6 +219,7 @@ TEST(FPreferWorkerThread, HoldsEachIdOnceAndPrefersIt)
     worker->addWork(new Work(log, "running", &started, &mayEnd), &first, nullptr);
     started.wait();
     EXPECT_EQ(first.getRefCount(), 2u) << "held while its work runs";
+    EXPECT_EQ(worker->getPriority(), kThreadPriorityLowest);
 
     EXPECT_TRUE(worker->addWork(new Work(log, "a"), nullptr));
     EXPECT_TRUE(worker->addWork(new Work(log, "b"), &second, nullptr));
