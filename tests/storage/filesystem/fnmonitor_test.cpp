@@ -7,6 +7,8 @@
 #include "storage/filesystem/ifilesystemlistener.h"
 #include "tests/storage/filefixture.h"
 
+#include <atomic>
+#include <thread>
 #include <vector>
 
 namespace
@@ -215,6 +217,28 @@ TEST_F(FNMonitorTest, ListenersMayLeaveWhenTheyAreTold)
     EXPECT_EQ(leaving.heard.size(), 1u);
     EXPECT_TRUE(listener.heard.empty());
     monitor->removeRegistry(&leaving);
+}
+
+TEST_F(FNMonitorTest, EndsWhileOtherThreadsTellOfChanges)
+{
+    std::atomic<bool> isOver{false};
+    std::thread teller(
+        [&]
+        {
+            const IPtr<FNPath> path = at("a");
+            while (!isOver)
+                files->onFileSystemChange(FileSystemChange::kWritten, path, nullptr);
+        });
+    for (int round = 0; round < 50; round++)
+    {
+        EXPECT_TRUE(monitor->start());
+        termFNMonitor();
+        EXPECT_FALSE(FNMonitor::existing());
+        monitor = FNMonitor::instance();
+        messenger->deliverMessages();
+    }
+    isOver = true;
+    teller.join();
 }
 
 TEST_F(FNMonitorTest, MountEventsGoToSubscribers)

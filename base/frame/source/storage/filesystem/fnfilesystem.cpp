@@ -366,7 +366,7 @@ bool FNFileSystem::copyNative(FNPath& from, FNPath& to, UProgressHook* hook, int
 
 void FNFileSystem::onFileSystemChange(int kind, const FNPath* path, const FNPath* newPath)
 {
-    FNMonitor* monitor = FNMonitor::existing();
+    const IPtr<FNMonitor> monitor = FNMonitor::existing();
     if (!path || !gMessenger || !monitor || !monitor->isRunning() || monitor->isPathExcluded(*path))
         return;
     FNPath folder(*path);

@@ -10,6 +10,8 @@
 #include "storage/filesystem/fnmonitorthread.h"
 #include "storage/filesystem/ifilesystemlistener.h"
 
+#include <mutex>
+#include <utility>
 #include <vector>
 
 namespace
@@ -18,6 +20,8 @@ constexpr const char* kPathChanged = "PathChanged";
 constexpr const char* kChange = "change";
 
 FObject* theMonitor = nullptr;
+// Guards the pointer: any thread may ask for the monitor while the main thread takes it down.
+std::mutex theMonitorLock;
 
 bool isAtOrBelow(const FNPath& path, const FNPath& folder)
 {
@@ -63,24 +67,30 @@ FNMonitor* FNMonitor::instance()
 {
     if (!theMonitor && !Singleton::isTerminated())
     {
+        const std::lock_guard<std::mutex> guard(theMonitorLock);
         theMonitor = new FNMonitor;
         Singleton::registerInstance(&theMonitor);
     }
-    return existing();
+    return static_cast<FNMonitor*>(theMonitor);
 }
 
-FNMonitor* FNMonitor::existing()
+IPtr<FNMonitor> FNMonitor::existing()
 {
+    const std::lock_guard<std::mutex> guard(theMonitorLock);
     return static_cast<FNMonitor*>(theMonitor);
 }
 
 void termFNMonitor()
 {
-    if (!theMonitor)
+    FNMonitor* monitor = nullptr;
+    {
+        const std::lock_guard<std::mutex> guard(theMonitorLock);
+        monitor = static_cast<FNMonitor*>(std::exchange(theMonitor, nullptr));
+    }
+    if (!monitor)
         return;
-    FObject* monitor = theMonitor;
-    // Gone for everybody before it goes: its thread may be asking.
-    theMonitor = nullptr;
+    // Ended here, since the last reference may be that of another thread which is just telling of a change.
+    monitor->stop();
     monitor->release();
 }
 

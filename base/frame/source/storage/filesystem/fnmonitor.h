@@ -2,6 +2,7 @@
 
 #include "containers/sequence/cmarray.h"
 #include "foundation/object/cmobject.h"
+#include "foundation/object/iptr.h"
 #include "foundation/thread/flock.h"
 #include "storage/path/fnpath.h"
 
@@ -39,8 +40,9 @@ class FNListenerEntry : public CmObject
 /// Watches folders and tells listeners what changed in them or below them.
 ///
 /// The watching thread and the file system post their news as messages "PathChanged"; listeners hear of them
-/// on the main thread. Listeners aren't owned and must be removed before they go. Exclude filters are
-/// thread-safe; all else belongs to the main thread.
+/// on the main thread. Listeners aren't owned and must be removed before they go. Whoever wants to hear of changes
+/// starts the monitor; the end of the program ends it. Exclude filters are thread-safe; all else belongs to the main
+/// thread.
 class FNMonitor : public CmObject
 {
     DECLARE_TYPE(FNMonitor, CmObject)
@@ -50,10 +52,11 @@ class FNMonitor : public CmObject
     ~FNMonitor() override;
     CmObject* newCopy() const override { return nullptr; }
 
-    /// Made by the first call. Null after the end of the program has taken it down.
+    /// Made by the first call. Null at the end of the process.
     static FNMonitor* instance();
-    /// The instance if there is one, without making it.
-    static FNMonitor* existing();
+    /// The instance if there is one, without making it. Thread-safe: the reference keeps it for as long as the caller
+    /// needs it.
+    static IPtr<FNMonitor> existing();
 
     /// Creates the thread. True if it runs.
     bool start();
@@ -108,5 +111,5 @@ private:
     std::atomic<bool> running{false};
 };
 
-/// Ends the monitor and takes the instance down.
+/// Ends the monitor and takes the instance down. Main thread.
 void termFNMonitor();
