@@ -11,6 +11,7 @@
 #include "storage/filesystem/fnmonitor.h"
 #include "storage/filesystem/iarchivelookup.h"
 #include "storage/filesystem/platformfiles.h"
+#include "storage/filesystem/volumewatch.h"
 #include "storage/path/filenametext.h"
 #include "storage/path/istandardfolders.h"
 #include "storage/stream/ffilestream.h"
@@ -387,11 +388,15 @@ void FNFileSystem::subscribeToMountEvent(CmObject* listener)
 {
     if (listener && !mountListeners.containsAbs(listener))
         mountListeners.add(listener);
+    if (!volumeWatch && !mountListeners.isEmpty())
+        volumeWatch = std::make_unique<VolumeWatch>(*this);
 }
 
 void FNFileSystem::unsubscribeFromMountEvent(CmObject* listener)
 {
     mountListeners.remove(listener);
+    if (mountListeners.isEmpty())
+        volumeWatch.reset();
 }
 
 void FNFileSystem::onMountEvent(const char* eventName, FNPath* root)

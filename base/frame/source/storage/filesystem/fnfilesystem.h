@@ -4,11 +4,13 @@
 #include "foundation/object/iptr.h"
 #include "storage/filesystem/ffilesystem.h"
 
+#include <memory>
 #include <string>
 
 class FFileType;
 class FNPath;
 class FUrl;
+class VolumeWatch;
 
 /// The disk. All access to files goes through the one object `gFileSystem`, which reports each change to the
 /// watcher.
@@ -154,7 +156,7 @@ class FNFileSystem : public FFileSystem
     /// without a messenger or a running watcher, and for excluded paths. Thread-safe.
     void onFileSystemChange(int kind, const FNPath* path, const FNPath* newPath);
     /// `listener` gets the messages "VolMount" and "VolUnmount", with the root as "kRootPath", at the next
-    /// pulse. Not counted.
+    /// pulse, as volumes come and go. Not counted. Main thread.
     void subscribeToMountEvent(CmObject* listener);
     void unsubscribeFromMountEvent(CmObject* listener);
     /// One of these names; others are ignored.
@@ -204,6 +206,8 @@ private:
     int32 signature = 0x3F3F3F3F;
     FNPath* lastPath = nullptr;
     CmLinkedList mountListeners;
+    // While anybody listens.
+    std::unique_ptr<VolumeWatch> volumeWatch;
     bool platformErrorsShown = true;
 };
 
