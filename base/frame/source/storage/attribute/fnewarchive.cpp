@@ -1,7 +1,7 @@
 #include "storage/attribute/fnewarchive.h"
 
-#include "foundation/object/classfactory.h"
 #include "storage/attribute/boundedread.h"
+#include "storage/attribute/storedclasses.h"
 #include "storage/stream/fstream.h"
 
 #include <algorithm>
@@ -14,27 +14,6 @@ constexpr uint32 kClassBit = 0x80000000;
 /// Above this a position with the top bit set would read as a marker.
 constexpr uint32 kMaxPosition = 0x7FFFFFFD;
 constexpr int kWrittenBuckets = 1000;
-
-MetaClass* findClass(const std::string& name)
-{
-    const ClassFactory* factory = ClassFactory::instance(false);
-    return factory ? factory->getMetaClassByName(name.c_str()) : nullptr;
-}
-
-/// Whether objects of the class can be a `className`. An alias has no base, so only its objects can tell.
-bool mayBe(const MetaClass& meta, const char* className)
-{
-    return !className || !meta.baseClass || meta.isTypeOf(className);
-}
-
-struct DepthScope
-{
-    explicit DepthScope(int& counter) : depth(counter) { depth++; }
-    ~DepthScope() { depth--; }
-    bool isTooDeep() const { return depth > FArchive::kMaxDepth; }
-
-    int& depth;
-};
 } // namespace
 
 FNewArchive::FNewArchive(FStream* archiveStream, bool writing, IArchiveErrorHook* hook)
@@ -58,7 +37,7 @@ int16 FNewArchive::getVersion(const char* className) const
     for (const StoredClass& stored : classes)
         if (stored.name == className)
             return stored.version;
-    const MetaClass* meta = findClass(className);
+    const MetaClass* meta = findStoredClass(className);
     return meta ? meta->classVersion : int16{0};
 }
 
@@ -72,7 +51,7 @@ bool FNewArchive::writeObject(const CmObject* object, bool shared)
         return stream->writeInt32(0);
     if (const uint32 id = shared ? getObjectID(object) : 0)
         return stream->writeInt32(static_cast<int32>(id));
-    DepthScope scope(depth);
+    FArchiveDepthScope scope(depth);
     if (scope.isTooDeep() || !writeClass(object->getClass()) || position() > kMaxPosition)
     {
         setError(kBadObject);
@@ -140,7 +119,7 @@ CmObject* FNewArchive::readObject(const char* className, bool shared)
         return nullptr;
     if (tag > 0)
         return findRead(static_cast<uint32>(tag), className);
-    DepthScope scope(depth);
+    FArchiveDepthScope scope(depth);
     if (scope.isTooDeep())
         return refuse();
     return readBody(readClass(tag), className, shared);
@@ -165,10 +144,8 @@ CmObject* FNewArchive::readBody(MetaClass* meta, const char* className, bool sha
     if (!stream->readInt32(length) || length < 0)
         return refuse();
     const int64 bodyStart = stream->tell();
-    IPtr<CmObject> object;
-    if (meta && meta->createFunction && mayBe(*meta, className))
-        object = createObject(*meta);
-    if (!object || (className && !object->isTypeOf(className, true)))
+    IPtr<CmObject> object = createStoredObject(meta, className);
+    if (!object)
     {
         stream->seek(bodyStart + length, kSeekStart);
         return refuse();
@@ -181,12 +158,6 @@ CmObject* FNewArchive::readBody(MetaClass* meta, const char* className, bool sha
     if (shared)
         objects[index].object = nullptr;
     return refuse();
-}
-
-IPtr<CmObject> FNewArchive::createObject(const MetaClass& meta)
-{
-    auto made = adopt(meta.createFunction());
-    return toCmObject(made);
 }
 
 bool FNewArchive::internalizeBody(CmObject& object, int64 bodyStart, int32 length)
@@ -240,12 +211,12 @@ MetaClass* FNewArchive::resolveClasses(size_t first)
     MetaClass* known = nullptr;
     for (size_t i = classes.size() - 1; i-- > first;)
     {
-        if (MetaClass* meta = findClass(classes[i].name))
+        if (MetaClass* meta = findStoredClass(classes[i].name))
             known = meta;
         classes[i].meta = known;
     }
     StoredClass& stored = classes.back();
-    stored.meta = findClass(stored.name);
+    stored.meta = findStoredClass(stored.name);
     if (!stored.meta)
         stored.meta = known;
     return stored.meta;

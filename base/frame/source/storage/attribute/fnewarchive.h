@@ -71,7 +71,6 @@ private:
     MetaClass* resolveClasses(size_t first);
     bool writeBody(const CmObject* object);
     CmObject* readBody(MetaClass* meta, const char* className, bool shared);
-    static IPtr<CmObject> createObject(const MetaClass& meta);
     bool internalizeBody(CmObject& object, int64 bodyStart, int32 length);
     CmObject* findRead(uint32 objectPosition, const char* className);
     CmObject* refuse();
