@@ -7,6 +7,7 @@ enum FatalCode
     kFatalNullPath = 2,
     kFatalConfiguration = 3,
     kFatalTrack = 4,
+    /// Also of the token file, for which nothing ends: it is told among the warnings.
     kFatalCache = 5,
     kFatalNoTrack = 6,
     kFatalNoDescription = 7,

@@ -85,6 +85,7 @@ void PUploadManagerApplication::quit()
 {
     endProgress();
     checkDeleteXmlFile();
+    addTokenFileWarning();
     setModalAlertActive(true);
     popupWarningList(nullptr);
     setModalAlertActive(false);

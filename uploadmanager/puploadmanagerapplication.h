@@ -148,6 +148,8 @@ private:
 
     void logOut(const FString& url);
     void storeToken(const FString& productName, const FString& token);
+    void saveTokens(const FAttributes& tokens);
+    void addTokenFileWarning();
     void fatalRedirectError(int code);
     bool openWaitingDescription();
 
@@ -174,6 +176,8 @@ private:
     bool requireLogin = false;
     bool deleteRequestFile = true;
     std::atomic<bool> ending{false};
+    /// A login or logout could not be stored, which the user is told at the end.
+    bool tokenFileFailed = false;
     /// What the translator was told; it keeps the pointer.
     FString storedLanguage;
 };

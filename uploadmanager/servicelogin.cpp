@@ -21,6 +21,8 @@
 #include "uploadmanager/vlmrprotocol.h"
 #include "uploadmanager/wiretext.h"
 
+#include <utility>
+
 // The login round trip: the token check, the browser, and the redirect that brings the token back.
 
 namespace
@@ -164,7 +166,23 @@ void PUploadManagerApplication::storeToken(const FString& productName, const FSt
     FAttributes tokens;
     FXmlArchive::loadAttributes(kTokenFile, kTokenRoot, tokens);
     tokens.set(FString(productName).text8(), token, true);
-    FXmlArchive::saveAttributes(kTokenFile, kTokenRoot, tokens);
+    saveTokens(tokens);
+}
+
+// The old file stays whole. A login holds for this run all the same; a logout has not happened.
+void PUploadManagerApplication::saveTokens(const FAttributes& tokens)
+{
+    if (!FXmlArchive::saveAttributes(kTokenFile, kTokenRoot, tokens))
+        tokenFileFailed = true;
+}
+
+void PUploadManagerApplication::addTokenFileWarning()
+{
+    if (!std::exchange(tokenFileFailed, false))
+        return;
+    FString text;
+    text.printf(strInternalError.text(), kFatalCache);
+    addWarning(text.text16());
 }
 
 bool PUploadManagerApplication::checkScError(CmDictionary& dictionary)
@@ -235,7 +253,7 @@ void PUploadManagerApplication::logOut(const FString& url)
         break;
     }
     tokens.setString8(name.text8(), "", true);
-    FXmlArchive::saveAttributes(kTokenFile, kTokenRoot, tokens);
+    saveTokens(tokens);
 }
 
 bool PUploadManagerApplication::openWaitingDescription()

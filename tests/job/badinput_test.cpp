@@ -179,7 +179,7 @@ TEST_F(BadRedirect, OfGreatLengthIsTakenAsItIs)
     const std::string kept(1000, 't'), tooLong(100000, 't');
     EXPECT_EQ(redirect("?access_token=" + kept), "");
     EXPECT_EQ(contentsOf(userFile("scat")), attributeFile("scat", {{"Loomrit", base64(kept)}}));
-    EXPECT_EQ(redirect("?access_token=" + tooLong), "");
+    EXPECT_EQ(redirect("?access_token=" + tooLong), errorCode(5));
     EXPECT_EQ(contentsOf(userFile("scat")), attributeFile("scat", {{"Loomrit", base64(kept)}}))
         << "longer than a value may be: the old file stays";
 }
@@ -262,11 +262,25 @@ TEST_F(BadUserFile, OnAFullDiskLeavesTheOldOneWhole)
     const std::string old = attributeFile("scat", {{"Loomrit", base64("old")}, {"Plenar", base64("other")}});
     writeUserFile("scat", old);
     const std::string redirect = "vlmr://loomrit/successfullLogin?access_token=" + token();
-    runWithoutDisk({redirect});
+    EXPECT_EQ(runWithoutDisk({redirect}), errorCode(5));
+    EXPECT_EQ(runWithoutDisk({"vlmr://logout/Loomrit"}), errorCode(5)) << "nobody was logged out";
 
     EXPECT_EQ(contentsOf(userFile("scat")), old);
     for (const fs::directory_entry& entry : fs::directory_iterator(userFolder))
         EXPECT_EQ(entry.path().filename(), "scat.xml");
+}
+
+TEST_F(BadUserFile, OnAFullDiskUploadsWithTheNewLoginAllTheSame)
+{
+    const std::string file = writeDescription(minimal());
+    writeUserFile("Vellamoor Upload Manager Cache",
+                  attributeFile("VellamoorUploadManagerCache", {{"latest request file", file}}));
+    const std::string printed = runWithoutDisk({"vlmr://loomrit/successfullLogin?access_token=" + token()});
+    EXPECT_EQ(received("/tracks").size(), 1u);
+    EXPECT_HOLDS(printed, errorCode(5));
+    EXPECT_EQ(printed.find(errorCode(5)), printed.rfind(errorCode(5))) << "told once";
+    EXPECT_FALSE(exists(file));
+    EXPECT_FALSE(exists(userFile("scat")));
 }
 
 TEST_F(BadUserFile, OnAFullDiskTellsThatTheDescriptionCannotWait)

@@ -164,7 +164,7 @@ TEST_F(Failure, OfTheTokenCheckToAnswerInXmlMeansANewLogin)
         const std::size_t opened = openedUrls().size();
         service->plan(plan);
         service->plan("/connect status 500 closed");
-        run({writeDescription(minimal())});
+        EXPECT_EQ(run({writeDescription(minimal())}), "") << "the login page is all that there is to see";
         EXPECT_TRUE(waitUntil([&] { return openedUrls().size() == opened + 1; })) << plan;
     }
     EXPECT_TRUE(received("/tracks").empty());
