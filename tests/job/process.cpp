@@ -75,7 +75,7 @@ std::optional<int> Process::wait(std::chrono::milliseconds time)
     while (!result)
     {
         int status = 0;
-        if (waitpid(child, &status, WNOHANG) == child)
+        if (wait4(child, &status, WNOHANG, &used) == child)
             result = WIFEXITED(status) ? WEXITSTATUS(status) : 128 + WTERMSIG(status);
         else if (std::chrono::steady_clock::now() >= end)
             break;

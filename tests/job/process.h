@@ -5,6 +5,7 @@
 #include <string>
 #include <vector>
 
+#include <sys/resource.h>
 #include <sys/types.h>
 
 /// How long anything may take before it counts as hanging. No test asserts a time; this only ends a broken run.
@@ -46,6 +47,8 @@ public:
     bool waitForOutput(const std::string& text);
 
     pid_t id() const { return child; }
+    /// What it used, once it has ended.
+    const rusage& usage() const { return used; }
     /// The most memory that it has had so far, in KiB; only while it runs.
     long peakMemory() const;
 
@@ -53,6 +56,7 @@ private:
     pid_t child = -1;
     std::string outputFile;
     std::optional<int> result;
+    rusage used{};
 };
 
 /// The bytes of a file; empty if it cannot be read.
