@@ -37,7 +37,7 @@ public:
     bool isUserImpatient() override
     {
         note("splash");
-        return true;
+        return isImpatient;
     }
     void activateMenuBar(bool state) override { note(state ? "menu bar on" : "menu bar off"); }
     void popupMessage(const char16* text, int duration) override
@@ -52,6 +52,8 @@ public:
     void deleteUIScripts() override { note("scripts"); }
     void deleteScriptManager() override { note(gController ? "script manager" : "script manager too late"); }
     void clearDrawDeviceFactory() override { note(gController ? "draw devices too early" : "draw devices"); }
+
+    bool isImpatient = true;
 };
 
 /// Notes what it is asked, and quits at once unless told otherwise.
@@ -104,6 +106,7 @@ public:
         return !text.isEmpty() && text.findNext(0, "good") >= 0;
     }
     using UApplication::backgroundState;
+    using UApplication::splashView;
 
     std::function<void()> onPreSplash;
     std::function<void()> onPostInit;

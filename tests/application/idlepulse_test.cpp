@@ -2,7 +2,9 @@
 
 #include "foundation/message/updatehandler.h"
 
+#include <atomic>
 #include <thread>
+#include <utility>
 
 namespace
 {
@@ -82,6 +84,51 @@ TEST_F(IdlePulse, TellsItsClientsAndDeliversMessages)
     gController->onIdle(false);
     EXPECT_EQ(gEvents.back(), "b Idle");
     EXPECT_EQ(gEvents.size(), 4u);
+}
+
+TEST_F(IdlePulse, EveryShareComesInItsTurn)
+{
+    struct Desktop : UDesktop
+    {
+        void onIdle() override { note("desktop"); }
+    } desktop;
+    struct Steps : NotedSteps
+    {
+        void idlePlugObjects() override { note(gController->isInIdleDispatch() ? "plug-ins" : "too late"); }
+        void serveModalPlugDialog() override { note("modal dialog"); }
+    } shares;
+    UDesktop* former = std::exchange(gDesktop, &desktop);
+    ApplicationSteps::set(&shares);
+    gController->addIdle(&a);
+    gController->deferDestruction(new Mortal);
+    post(b, "posted");
+    gController->onIdle(false);
+    ApplicationSteps::set(&steps);
+    gDesktop = former;
+    EXPECT_EQ(gEvents, (Lines{"desktop", "a Idle", "plug-ins", "destroyed", "b posted", "modal dialog"}));
+    EXPECT_FALSE(gController->isInIdleDispatch());
+}
+
+TEST_F(IdlePulse, AClientIsNotTakenOutByAnotherThreadWhileItIsTold)
+{
+    gController->addIdle(&a);
+    std::atomic<bool> isOut{false};
+    std::thread other;
+    a.reaction = [&]
+    {
+        other = std::thread(
+            [&]
+            {
+                gController->removeIdle(&a);
+                isOut = true;
+            });
+        UController::wait(20);
+        EXPECT_FALSE(isOut);
+    };
+    gController->onIdle(false);
+    other.join();
+    gController->onIdle(false);
+    EXPECT_EQ(gEvents, (Lines{"a Idle"}));
 }
 
 TEST_F(IdlePulse, ClientsComeAndGoDuringTheDispatch)

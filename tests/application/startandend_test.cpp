@@ -5,6 +5,8 @@
 #include "storage/filesystem/fnfilesystem.h"
 
 #include <algorithm>
+#include <cstdlib>
+#include <fstream>
 #include <thread>
 #include <utility>
 
@@ -67,6 +69,26 @@ TEST_F(StartAndEnd, EveryStepIsAtItsPlace)
     EXPECT_EQ(gTranslator, nullptr);
     EXPECT_EQ(gComponentRegistry, nullptr);
     EXPECT_EQ(IStandardFolders::instance(), nullptr);
+}
+
+TEST_F(StartAndEnd, TheSplashScreenStaysForItsTimeOrUntilTheUserIsImpatient)
+{
+    int view = 0;
+    for (const bool isImpatient : {true, false})
+    {
+        gEvents.clear();
+        steps.isImpatient = isImpatient;
+        UApplication::splashScreenDelay = isImpatient ? 1000000 : 30;
+        auto application = adopt(new NotedApplication);
+        application->splashView = reinterpret_cast<UView*>(&view);
+        application->run();
+        const auto menus = std::find(gEvents.begin(), gEvents.end(), "menus");
+        const auto end = std::find(gEvents.begin(), gEvents.end(), "post init");
+        ASSERT_LT(menus, end);
+        EXPECT_EQ(std::count(gEvents.begin(), gEvents.end(), "splash"), end - menus - 1);
+        EXPECT_EQ(end - menus == 2, isImpatient) << "asked once, or again and again";
+    }
+    UApplication::splashScreenDelay = 0;
 }
 
 TEST_F(StartAndEnd, AnExitAskedForEarlyStopsTheStart)
@@ -175,6 +197,45 @@ TEST_F(StartAndEnd, FoldersFollowTheEnvironment)
     auto application = adopt(new NotedApplication("Other"));
     EXPECT_EQ(std::string(FString(gController->getUserPath()).text8()), home + "/.config/Other/");
     EXPECT_EQ(std::string(FString(gController->getSharedPath()).text8()), home + "/data/Vellamoor/");
+}
+
+// Not a test: the role of a program that was started from a bundle.
+TEST(BundleRole, DISABLED_Program)
+{
+    const std::string bundle = getenv("BUNDLE_TEST_FOLDER");
+    UApplication::setTranslationEnabled(true);
+    auto application = adopt(new NotedApplication);
+    EXPECT_EQ(std::string(FString(gController->getAppPath()).text8()), bundle + "/Contents/");
+    EXPECT_EQ(std::string(FString(gController->getAppFileName()).text8()), "Some Program");
+    application->run();
+    EXPECT_STREQ(gTranslator->getUserLanguageCode(), getenv("BUNDLE_TEST_LANGUAGE"));
+}
+
+TEST_F(StartAndEnd, AProgramKnowsItsBundleAndSpeaksItsLanguages)
+{
+    const std::string bundle = home + "/Some Program";
+    const std::string program = bundle + "/Contents/Linux/program";
+    std::filesystem::create_directories(bundle + "/Contents/Linux");
+    std::filesystem::copy_file("/proc/self/exe", program);
+    std::ofstream(bundle + "/Contents/translation.xml")
+        << "<?xml version=\"1.0\" encoding=\"utf-8\"?><Translations><LanguageTable>"
+           "<language key=\"us\">American English</language><language "
+           "key=\"de\">Deutsch</language></LanguageTable>"
+           "<StringTable><String Key=\"Yes\"><de>Ja</de></String></StringTable></Translations>";
+    setenv("BUNDLE_TEST_FOLDER", std::filesystem::canonical(bundle).c_str(), 1);
+    setenv("LC_ALL", "de_DE.UTF-8", 1);
+    const auto speaks = [&](const char* language)
+    {
+        setenv("BUNDLE_TEST_LANGUAGE", language, 1);
+        const std::string command =
+            "'" + program +
+            "' --gtest_filter=BundleRole.DISABLED_Program --gtest_also_run_disabled_tests --gtest_brief=1";
+        return system(command.c_str()) == 0;
+    };
+    EXPECT_TRUE(speaks("de"));
+    std::ofstream(bundle + "/Contents/BABELFISH").close();
+    EXPECT_TRUE(speaks("us")) << "as its authors wrote it";
+    unsetenv("LC_ALL");
 }
 
 TEST_F(StartAndEnd, ATemporaryFolderOfSomebodyElseIsNotUsed)
