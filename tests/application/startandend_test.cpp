@@ -69,6 +69,7 @@ TEST_F(StartAndEnd, EveryStepIsAtItsPlace)
     EXPECT_EQ(gTranslator, nullptr);
     EXPECT_EQ(gComponentRegistry, nullptr);
     EXPECT_EQ(IStandardFolders::instance(), nullptr);
+    EXPECT_TRUE(UController::canTerminate()) << "nothing is left to ask";
 }
 
 TEST_F(StartAndEnd, TheSplashScreenStaysForItsTimeOrUntilTheUserIsImpatient)

@@ -1,9 +1,11 @@
 #include "foundation/message/fmessage.h"
 #include "foundation/message/fmessenger.h"
 #include "foundation/message/imessagereceiver.h"
+#include "foundation/thread/fthread.h"
 
 #include <gtest/gtest.h>
 
+#include <atomic>
 #include <functional>
 #include <string>
 #include <thread>
@@ -195,6 +197,28 @@ TEST_F(FMessengerTest, FindsReceiversByName)
     messenger.registerName("left behind", &a);
 }
 
+TEST_F(FMessengerTest, ANameIsNotTakenBackWhileItsReceiverIsCalled)
+{
+    std::atomic<bool> isTakenBack{false};
+    std::thread other;
+    a.reaction = [&]
+    {
+        other = std::thread(
+            [&]
+            {
+                messenger.unregisterName("a");
+                isTakenBack = true;
+            });
+        FThreadSleep(20);
+        EXPECT_FALSE(isTakenBack);
+    };
+    messenger.registerName("a", &a);
+    FMessage message("named");
+    messenger.sendMessage("a", &message, false);
+    other.join();
+    EXPECT_EQ(messenger.sendMessage("a", &message, false), 0);
+}
+
 TEST_F(FMessengerTest, SendsNamedMessagesToTheNetworkFirst)
 {
     struct Network : INetworkMessenger
@@ -264,6 +288,9 @@ TEST_F(FMessengerTest, ServesReceiversOutsideTheClassTree)
         Lines received;
     } outside;
     IMessenger& face = messenger;
+    EXPECT_EQ(face.postMessage(nullptr, make("to nobody")), -1);
+    EXPECT_EQ(face.postMessage(&outside, nullptr), -1);
+    EXPECT_EQ(face.killMessages(nullptr, nullptr), -1);
     EXPECT_EQ(face.postMessage(&outside, make("x")), 0);
     EXPECT_TRUE(face.wasMessagePosted(&outside));
     messenger.deliverMessages();

@@ -49,6 +49,8 @@ bool askFileManager(const char* uri)
 }
 } // namespace
 
+// The desktop's handler gets the text as it is: GFile, which rewrites URLs, is asked only where no program has
+// registered for the scheme.
 bool DesktopServices::openUrl(const char* url)
 {
     return g_uri_is_valid(url, G_URI_FLAGS_PARSE_RELAXED, nullptr) &&

@@ -89,16 +89,6 @@ class UController : public CmObject, public IPlatform2, public IStandardFolders
     /// "Notification", "PopupMessage" and "Quit".
     int notify(FMessage* message) override;
 
-protected:
-    /// The earliest time of the next throttled pulse.
-    int64 idealNextIdle = 0;
-    // The state of the input, for windows.
-    bool mouseSuspended = false;
-    bool updatesSuspended = false;
-    int modifiers = 0;
-    /// Milliseconds.
-    int doubleClickTime = 200;
-
 private:
     bool initPlatform(int applicationType);
     bool locateBundle();
@@ -107,11 +97,21 @@ private:
     void destroyDeferred();
     CmObject* takeDeferred();
 
+protected:
     bool done = false;
     bool flushEnabled = true;
+    bool mouseSuspended = false;
     bool inIdle = false;
     bool idleSuspended = false;
+    bool updatesSuspended = false;
     bool inIdleDispatch = false;
+    // The state of the input, for windows; milliseconds.
+    int modifiers = 0;
+    int doubleClickTime = 200;
+    /// The earliest time of the next throttled pulse.
+    int64 idealNextIdle = 0;
+
+private:
     UMenu* menuBar = nullptr;
     FLock idleLock{"idle"};
     CmArray idleClients{0, 10};

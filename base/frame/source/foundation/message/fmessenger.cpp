@@ -104,7 +104,11 @@ int32 FMessenger::postMessage(IMessageReceiver* receiver, IMessage* message)
 {
     auto* posted = FCast(FMessage, toFObject(message));
     if (!receiver || !posted)
+    {
+        if (message)
+            message->release();
         return -1;
+    }
     doPostMessage(identityOf(receiver), posted, false, 0);
     return kResultOk;
 }

@@ -9,7 +9,8 @@ class IMessageReceiver;
 class IMessenger : public FUnknown
 {
 public:
-    /// Takes over the caller's reference on `message`, which must come from the framework. Any thread.
+    /// Takes over the caller's reference on `message`, which must come from the framework. 0, or -1 where there is no
+    /// receiver or no such message. Any thread.
     virtual int32 postMessage(IMessageReceiver* receiver, IMessage* message) = 0;
     /// Drops the waiting messages of `receiver`: those of the type of `message`, or all if that is null.
     virtual int32 killMessages(IMessageReceiver* receiver, IMessage* message) = 0;
