@@ -173,7 +173,6 @@ void FUrl::setUrl(const char16* text)
 {
     FString rest(text);
     rest.trim();
-    dropHandler();
     const int place = rest.findNext(0, kProtocolEnd);
     if (place >= 0)
     {
@@ -391,6 +390,10 @@ void FUrl::registerHandler(const FString& handlerProtocol, uint16 defaultPort, H
 
 bool FUrl::makeHandler()
 {
+    if (handler && handledProtocol == protocol)
+        return true;
+    dropHandler();
+    handledProtocol = protocol;
     for (int i = 0; !handler && i < allHandlers().total(); i++)
         if (handlerAt(i)->protocol == protocol)
             handler = handlerAt(i)->factory(*this);

@@ -37,7 +37,7 @@ class FUrl : public FPath, public IUrl
     // Text
     void set(const char* newProtocol, const char* newHost, uint16 newPort, const char16* newFile);
     /// Replaces all but what the text doesn't tell: without "://" the protocol stays, and without a port that
-    /// of a protocol that nobody handles.
+    /// of a protocol that nobody handles. The handler stays too, which may be the one that follows a redirection.
     void setUrl(const char16* text) override;
     /// Without user and password. True when the result isn't empty.
     bool getUrl(FString& result) const;
@@ -73,7 +73,8 @@ class FUrl : public FPath, public IUrl
     using FPath::newCopy;
 
     // Transfer
-    /// Makes the handler of the protocol if there is none yet; false where nobody handles it.
+    /// Makes the handler of the protocol if there is none yet, in the place of one of an earlier protocol; false
+    /// where nobody handles it.
     bool makeHandler();
     /// Owned by the URL; null until `makeHandler`.
     FUrlHandler* getHandler() const { return handler; }
@@ -105,4 +106,5 @@ private:
     FString file;
     FString user;
     FString password;
+    FString handledProtocol;
 };
