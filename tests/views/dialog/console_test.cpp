@@ -1,8 +1,10 @@
 #include "foundation/object/classfactory.h"
 #include "foundation/object/iptr.h"
+#include "foundation/text/fstring.h"
 #include "foundation/text/iuseralert.h"
 #include "views/dialog/iprogress.h"
 #include "views/dialog/ualert.h"
+#include "views/dialog/ucommondialog.h"
 #include "views/dialog/uconsole.h"
 
 #include <gtest/gtest.h>
@@ -49,6 +51,14 @@ TEST(Console, WritesAnAlertAsOneBlockAndTakesTheFirstButton)
                   }),
               "Two lines:\nGr\u00fc\u00dfe \u65e5\u672c\n");
     EXPECT_EQ(answer, 1);
+}
+
+TEST(Console, CancelsWhatHadToBeTyped)
+{
+    FString name(u"ada"), password(u"secret");
+    EXPECT_EQ(printedBy([&] { EXPECT_FALSE(UCommonDialog::getNameAndPassword(u"Who?", name, password)); }),
+              "Who?\n");
+    EXPECT_TRUE(name == ConstString(u"ada") && password == ConstString(u"secret"));
 }
 
 TEST(Console, TakesTheLastButtonOfAQuestion)
