@@ -68,7 +68,8 @@ endfunction()
 
 function(house_add_rooms)
   add_library(framework INTERFACE)
-  target_link_libraries(framework INTERFACE house_options PkgConfig::EXPAT PkgConfig::ICU PkgConfig::GIO)
+  target_link_libraries(framework INTERFACE house_options PkgConfig::EXPAT PkgConfig::ICU PkgConfig::GIO
+                                            PkgConfig::OPENSSL)
   foreach(room IN LISTS HOUSE_ROOMS)
     house_room_folder(${room} folder)
     file(GLOB sources CONFIGURE_DEPENDS ${folder}/*.cpp)

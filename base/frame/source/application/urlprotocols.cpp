@@ -1,17 +1,12 @@
 #include "application/urlprotocols.h"
 
 #include "application/onetimeprocedure.h"
-#include "storage/url/furl.h"
+#include "network/http/furlhttphandler.h"
+#include "network/http/furlhttpshandler.h"
 #include "storage/url/furlfilehandler.h"
 
 namespace
 {
-// Nothing here speaks these protocols yet; a URL of theirs still knows its port.
-FUrlHandler* createNothing(FUrl&)
-{
-    return nullptr;
-}
-
 OneTimeProcedure protocols("URL protocols", 0, &registerUrlProtocols);
 } // namespace
 
@@ -22,7 +17,7 @@ bool registerUrlProtocols()
         return true;
     isDone = true;
     initFUrlFileHandler();
-    FUrl::registerHandler(FString("http"), 80, createNothing);
-    FUrl::registerHandler(FString("https"), 443, createNothing);
+    initFUrlHttpHandler();
+    initFUrlHttpsHandler();
     return true;
 }

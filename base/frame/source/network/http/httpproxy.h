@@ -1,0 +1,22 @@
+#pragma once
+
+#include "foundation/text/fstring.h"
+
+/// The proxy that the user's settings name for all requests of HTTP.
+struct HttpProxy
+{
+    /// The settings as they are now, by default none. They are read without a lock, so nobody may change them while
+    /// a transfer begins.
+    static HttpProxy fromDefaults();
+
+    bool isUsed() const { return !host.isEmpty(); }
+
+    /// Empty where requests go straight to their hosts.
+    FString host;
+    /// 0 where the setting is no port; nobody listens there.
+    uint16 port = 0;
+    /// Whether the credentials go out before the proxy asks for them.
+    bool authenticate = false;
+    FString user;
+    FString password;
+};
