@@ -38,15 +38,6 @@ CmBTree::CmBTree(const CmBTree& other) : CmContainer(other), _order(other._order
     CmContainer::copy(other);
 }
 
-CmBTree& CmBTree::operator=(const CmBTree& other)
-{
-    if (&other == this)
-        return *this;
-    removeAll();
-    copy(other);
-    return *this;
-}
-
 CmBTree::~CmBTree()
 {
     CmBTree::removeAll();

@@ -15,7 +15,7 @@ class CmBTree : public CmContainer
     /// An order below 3 becomes 3.
     explicit CmBTree(int order = 10);
     CmBTree(const CmBTree& other);
-    CmBTree& operator=(const CmBTree& other);
+    CmBTree& operator=(const CmBTree& other) { return assign(*this, other); }
     ~CmBTree() override;
 
     bool add(CmObject* object) override;

@@ -5,12 +5,3 @@
 template class CmDictionaryOf<CmBTree>;
 
 DEFINE_CLASS(CmBTreeDictionary, CmBTree)
-
-CmBTreeDictionary& CmBTreeDictionary::operator=(const CmBTreeDictionary& other)
-{
-    if (&other == this)
-        return *this;
-    removeAll();
-    copy(other);
-    return *this;
-}

@@ -15,5 +15,5 @@ class CmBTreeDictionary : public CmDictionaryOf<CmBTree>
     {
         CmContainer::copy(other);
     }
-    CmBTreeDictionary& operator=(const CmBTreeDictionary& other);
+    CmBTreeDictionary& operator=(const CmBTreeDictionary& other) { return assign(*this, other); }
 };

@@ -6,15 +6,6 @@ template class CmDictionaryOf<CmDLinkedList>;
 
 DEFINE_CLASS(CmDictionary, CmDLinkedList)
 
-CmDictionary& CmDictionary::operator=(const CmDictionary& other)
-{
-    if (&other == this)
-        return *this;
-    removeAll();
-    copy(other);
-    return *this;
-}
-
 CmObject* CmDictionary::lookupKey(const CmObject* object) const
 {
     for (CmDLinkedListIterator it(*this); !it.done(); it.next())

@@ -12,7 +12,7 @@ class CmDictionary : public CmDictionaryOf<CmDLinkedList>
 
     CmDictionary() = default;
     CmDictionary(const CmDictionary& other) : CmDictionaryOf() { CmContainer::copy(other); }
-    CmDictionary& operator=(const CmDictionary& other);
+    CmDictionary& operator=(const CmDictionary& other) { return assign(*this, other); }
 
     /// The first key whose object is equal to `object`, borrowed.
     CmObject* lookupKey(const CmObject* object) const;

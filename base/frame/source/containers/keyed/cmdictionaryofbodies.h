@@ -4,7 +4,7 @@
 #include "containers/sequence/cmcontainer.h"
 
 #include <memory>
-#include <utility>
+#include <vector>
 
 // The bodies of CmDictionaryOf, for the sources that instantiate it.
 
@@ -70,9 +70,13 @@ bool CmDictionaryOf<Container>::removeAt(int index)
 template <class Container>
 void CmDictionaryOf<Container>::removeAll()
 {
+    std::vector<Pair> pairs;
     for (std::unique_ptr<CmIterator> it(this->newIterator()); !it->done();)
-        giveUp(Pair(it->next()));
+        pairs.emplace_back(it->next());
+    // The pairs are out before they are released: a destructor may look at this dictionary.
     Container::removeAll();
+    for (const Pair& pair : pairs)
+        giveUp(pair);
 }
 
 template <class Container>

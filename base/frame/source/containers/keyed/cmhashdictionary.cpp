@@ -5,12 +5,3 @@
 template class CmDictionaryOf<CmHashTable>;
 
 DEFINE_CLASS(CmHashDictionary, CmHashTable)
-
-CmHashDictionary& CmHashDictionary::operator=(const CmHashDictionary& other)
-{
-    if (&other == this)
-        return *this;
-    removeAll();
-    copy(other);
-    return *this;
-}

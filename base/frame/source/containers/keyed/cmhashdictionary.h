@@ -17,5 +17,5 @@ class CmHashDictionary : public CmDictionaryOf<CmHashTable>
     {
         CmContainer::copy(other);
     }
-    CmHashDictionary& operator=(const CmHashDictionary& other);
+    CmHashDictionary& operator=(const CmHashDictionary& other) { return assign(*this, other); }
 };

@@ -42,15 +42,6 @@ CmHashTable::CmHashTable(const CmHashTable& other) : CmHashTable(SettingsOf{othe
     CmContainer::copy(other);
 }
 
-CmHashTable& CmHashTable::operator=(const CmHashTable& other)
-{
-    if (&other == this)
-        return *this;
-    removeAll();
-    copy(other);
-    return *this;
-}
-
 CmHashTable::~CmHashTable()
 {
     CmHashTable::removeAll();

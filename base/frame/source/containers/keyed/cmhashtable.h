@@ -33,7 +33,7 @@ class CmHashTable : public CmContainer
     /// Without buckets every `add` is refused.
     explicit CmHashTable(int size = 10);
     CmHashTable(const CmHashTable& other);
-    CmHashTable& operator=(const CmHashTable& other);
+    CmHashTable& operator=(const CmHashTable& other) { return assign(*this, other); }
     ~CmHashTable() override;
 
     /// Null stands for the `hash` of the elements. Only an empty table may change it.

@@ -31,6 +31,7 @@ class CmContainer : public CmObject
     CmContainer() = default;
     /// Copies no elements: the concrete classes follow with `copy`.
     CmContainer(const CmContainer& other) : CmObject(other) {}
+    /// The concrete classes assign by `assign`.
     CmContainer& operator=(const CmContainer&) = delete;
 
     // Operations, in their slot order
@@ -114,6 +115,9 @@ protected:
     void testRemember(CmObject* object) const;
     /// Called by every removal that doesn't hand the element back: releases it in modes 1 and 2.
     void testDelete(CmObject* object) const;
+    /// What `operator=` of a concrete class does: removes all of `target`, then follows `copy`.
+    template <class Container>
+    static Container& assign(Container& target, const CmContainer& source);
     /// Adds an element of another container, or a copy of it, as the mode says.
     virtual bool addFromOther(CmObject* element);
     /// Adds an element that was restored from a file, and takes over the reference on it in any case.
@@ -122,3 +126,13 @@ protected:
     int32 _size = 0;
     int16 _ownsObjects = kShared;
 };
+
+template <class Container>
+Container& CmContainer::assign(Container& target, const CmContainer& source)
+{
+    if (&source == &target)
+        return target;
+    target.removeAll();
+    target.copy(source);
+    return target;
+}

@@ -5,12 +5,3 @@
 template class CmNodeList<CmDLinkedNode>;
 
 DEFINE_CLASS(CmDLinkedList, CmContainer)
-
-CmDLinkedList& CmDLinkedList::operator=(const CmContainer& other)
-{
-    if (&other == this)
-        return *this;
-    removeAll();
-    copy(other);
-    return *this;
-}

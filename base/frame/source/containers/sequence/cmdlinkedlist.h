@@ -30,11 +30,8 @@ class CmDLinkedList : public CmNodeList<CmDLinkedNode>
     CmDLinkedList() = default;
     CmDLinkedList(const CmDLinkedList& other) : CmNodeList(other) { CmContainer::copy(other); }
     explicit CmDLinkedList(const CmContainer& other) { CmContainer::copy(other); }
-    CmDLinkedList& operator=(const CmDLinkedList& other)
-    {
-        return *this = static_cast<const CmContainer&>(other);
-    }
-    CmDLinkedList& operator=(const CmContainer& other);
+    CmDLinkedList& operator=(const CmDLinkedList& other) { return assign(*this, other); }
+    CmDLinkedList& operator=(const CmContainer& other) { return assign(*this, other); }
 };
 
 using CmDLinkedListIterator = CmNodeListIterator<CmDLinkedNode>;

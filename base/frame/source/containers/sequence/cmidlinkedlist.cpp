@@ -12,32 +12,6 @@ template class CmNodeList<CmIDLink>;
 
 DEFINE_CLASS(CmIDLinkedList, CmContainer)
 
-CmIDLinkedList& CmIDLinkedList::operator=(const CmContainer& other)
-{
-    if (&other == this)
-        return *this;
-    removeAll();
-    copy(other);
-    return *this;
-}
-
-void CmIDLinkedList::copy(const CmContainer& source)
-{
-    if (source.getOwnership() == kTaken)
-        CmContainer::copy(source);
-    else if (&source != this)
-        setOwnership(source.getOwnership());
-}
-
-void CmIDLinkedList::takeOver(CmIDLinkedList& other)
-{
-    if (&other == this)
-        return;
-    removeAll();
-    setOwnership(other.getOwnership());
-    appendList(other);
-}
-
 bool CmIDLinkedList::remove(CmIDLink* link)
 {
     return link && isHere(link) && removeAbs(link);

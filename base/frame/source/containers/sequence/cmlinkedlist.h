@@ -31,11 +31,8 @@ class CmLinkedList : public CmNodeList<CmLinkedNode>
     CmLinkedList() = default;
     CmLinkedList(const CmLinkedList& other) : CmNodeList(other) { CmContainer::copy(other); }
     explicit CmLinkedList(const CmContainer& other) { CmContainer::copy(other); }
-    CmLinkedList& operator=(const CmLinkedList& other)
-    {
-        return *this = static_cast<const CmContainer&>(other);
-    }
-    CmLinkedList& operator=(const CmContainer& other);
+    CmLinkedList& operator=(const CmLinkedList& other) { return assign(*this, other); }
+    CmLinkedList& operator=(const CmContainer& other) { return assign(*this, other); }
 };
 
 using CmLinkedListIterator = CmNodeListIterator<CmLinkedNode>;

@@ -68,11 +68,6 @@ protected:
     Node* nodeAt(int index) const;
     Node* before(const Node* node) const { return CmNodeRules<Node>::before(node, _first); }
     static CmObject* objectOf(Node* node) { return node ? CmNodeRules<Node>::objectOf(node) : nullptr; }
-    /// Take all nodes of another list with their references, in constant time; the modes stay.
-    void appendNodes(CmNodeList& other);
-    void prependNodes(CmNodeList& other);
-    /// Exchanges the elements and the modes.
-    void swapNodes(CmNodeList& other);
     /// The node under a cursor over this list, else null.
     Node* nodeUnder(const CmIterator& position) const;
 

@@ -3,9 +3,18 @@
 #include "containers/sequence/cmnodelist.h"
 
 #include <memory>
-#include <utility>
 
 // The bodies of CmNodeList, for the sources that instantiate it.
+
+/// The node that leads to `node`, found from the front; null for the first one.
+template <class Node>
+Node* findBefore(const Node* node, Node* first)
+{
+    Node* found = first == node ? nullptr : first;
+    while (found && found->next != node)
+        found = found->next;
+    return found;
+}
 
 template <class Node>
 bool CmNodeList<Node>::remove(CmObject* object)
@@ -155,7 +164,7 @@ template <class Node>
 bool CmNodeList<Node>::link(CmObject* object, Node* predecessor)
 {
     Node* node = object ? CmNodeRules<Node>::make(object) : nullptr;
-    // A link that is here already as the only one shows no neighbours.
+    // A link that is here already need not show it: an end has no neighbour.
     if (!node || node == _first || node == _last)
         return false;
     node->next = predecessor ? predecessor->next : _first;
@@ -204,42 +213,6 @@ Node* CmNodeList<Node>::nodeAt(int index) const
     while (index-- > 0)
         node = node->next;
     return node;
-}
-
-template <class Node>
-void CmNodeList<Node>::appendNodes(CmNodeList& other)
-{
-    if (&other == this || !other._first)
-        return;
-    (_last ? _last->next : _first) = other._first;
-    CmNodeRules<Node>::setPrevious(other._first, _last);
-    _last = std::exchange(other._last, nullptr);
-    other._first = nullptr;
-    _size += std::exchange(other._size, 0);
-}
-
-template <class Node>
-void CmNodeList<Node>::prependNodes(CmNodeList& other)
-{
-    if (&other == this || !other._first)
-        return;
-    other._last->next = _first;
-    if (_first)
-        CmNodeRules<Node>::setPrevious(_first, other._last);
-    else
-        _last = other._last;
-    _first = std::exchange(other._first, nullptr);
-    other._last = nullptr;
-    _size += std::exchange(other._size, 0);
-}
-
-template <class Node>
-void CmNodeList<Node>::swapNodes(CmNodeList& other)
-{
-    std::swap(_first, other._first);
-    std::swap(_last, other._last);
-    std::swap(_size, other._size);
-    std::swap(_ownsObjects, other._ownsObjects);
 }
 
 template <class Node>
