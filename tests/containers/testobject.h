@@ -60,6 +60,23 @@ class LinkedItem : public Link
     int rank;
 };
 
+/// What a container of this class takes.
+template <class Container>
+struct ElementOf
+{
+    using Type = Item;
+};
+template <>
+struct ElementOf<CmILinkedList>
+{
+    using Type = LinkedItem<CmILink>;
+};
+template <>
+struct ElementOf<CmIDLinkedList>
+{
+    using Type = LinkedItem<CmIDLink>;
+};
+
 inline int rankOf(const CmObject* object)
 {
     if (const Item* item = FCast(Item, object))

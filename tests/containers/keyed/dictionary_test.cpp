@@ -96,6 +96,40 @@ TYPED_TEST(DictionaryTest, ReleasesKeyAndObjectInMode1)
     EXPECT_EQ(Item::alive, 2);
 }
 
+namespace
+{
+/// Asks its dictionary for every key while it goes.
+class Curious : public CmObject
+{
+    DECLARE_COPYABLE(Curious, CmObject)
+
+    explicit Curious(const CmContainer& asked) : dictionary(asked) {}
+    ~Curious() override
+    {
+        for (int rank = 0; rank < 3; rank++)
+            found += dictionary.contains(std::make_unique<Item>(rank).get()) ? 1 : 0;
+    }
+
+    inline static int found = 0;
+
+    const CmContainer& dictionary;
+};
+} // namespace
+
+TYPED_TEST(DictionaryTest, HasLetGoOfWhatItReleases)
+{
+    TypeParam dictionary;
+    dictionary.takeElements();
+    for (int rank = 0; rank < 3; rank++)
+        dictionary.add(new Item(rank), new Curious(dictionary));
+    Curious::found = 0;
+    const Item first(0);
+    EXPECT_TRUE(dictionary.remove(const_cast<Item*>(&first)));
+    EXPECT_EQ(Curious::found, 2);
+    dictionary.removeAll();
+    EXPECT_EQ(Curious::found, 2);
+}
+
 TYPED_TEST(DictionaryTest, OwnsItsAssociationsInEveryMode)
 {
     Item key(1), object(2), otherKey(3);

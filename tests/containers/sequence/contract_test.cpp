@@ -23,22 +23,6 @@
 namespace
 {
 template <class Container>
-struct ElementOf
-{
-    using Type = Item;
-};
-template <>
-struct ElementOf<CmILinkedList>
-{
-    using Type = LinkedItem<CmILink>;
-};
-template <>
-struct ElementOf<CmIDLinkedList>
-{
-    using Type = LinkedItem<CmIDLink>;
-};
-
-template <class Container>
 class ContractTest : public testing::Test
 {
 protected:
@@ -204,6 +188,29 @@ TYPED_TEST(ContractTest, CopiesAsTheModeOfTheSourceSays)
     EXPECT_EQ(Item::alive, 3);
 }
 
+TYPED_TEST(ContractTest, CopiesShareInTheOtherModes)
+{
+    // An element with links of its own can stand in one container only.
+    const bool canShare = std::is_same_v<typename TestFixture::Element, Item>;
+    const IPtr<CmObject> element = adopt(this->make(1));
+    for (int16 mode : {CmContainer::kShared, CmContainer::kRetained})
+    {
+        TypeParam source;
+        source.setOwnership(mode);
+        source.add(element);
+        const unsigned perContainer = mode == CmContainer::kRetained ? 1 : 0;
+        const TypeParam copied(source);
+        EXPECT_EQ(copied.getOwnership(), mode);
+        EXPECT_EQ(copied.containsAbs(element), canShare);
+        EXPECT_EQ(element->getRefCount(), 1 + perContainer * (canShare ? 2 : 1));
+    }
+    CmArray array;
+    array.add(element);
+    TypeParam fromArray;
+    fromArray.copy(array);
+    EXPECT_TRUE(fromArray.containsAbs(element)) << "free elements can be linked";
+}
+
 TYPED_TEST(ContractTest, TakesAllWithOrWithoutAReference)
 {
     CmArray source;
@@ -262,6 +269,8 @@ TEST(CmContainer, AsksFilters)
     EXPECT_TRUE(array.query(belowThree, result));
     EXPECT_EQ(ranksOf(result), "0 1 2");
     EXPECT_FALSE(array.query(none, result));
+    EXPECT_TRUE(result.query(belowThree, result)) << "must come to an end";
+    EXPECT_EQ(ranksOf(result), "0 1 2 0 1 2");
     EXPECT_EQ(array.firstThat(none), nullptr);
     EXPECT_EQ(array.lastThat(belowThree), array.at(2));
     BelowFilter stopping(3);

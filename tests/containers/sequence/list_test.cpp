@@ -11,22 +11,6 @@
 namespace
 {
 template <class List>
-struct ElementOf
-{
-    using Type = Item;
-};
-template <>
-struct ElementOf<CmILinkedList>
-{
-    using Type = LinkedItem<CmILink>;
-};
-template <>
-struct ElementOf<CmIDLinkedList>
-{
-    using Type = LinkedItem<CmIDLink>;
-};
-
-template <class List>
 class ListTest : public testing::Test
 {
 protected:
@@ -208,6 +192,16 @@ TYPED_TEST(IntrusiveListTest, RefusesWhatCannotBeLinked)
     this->list.removeAt(0);
     EXPECT_FALSE(this->list.add(this->list.first()));
     this->expectRanks("2", "2");
+}
+
+TYPED_TEST(IntrusiveListTest, RemovesThisVeryLink)
+{
+    this->fill({1, 2, 1});
+    auto* last = static_cast<typename TestFixture::Element*>(this->list.last());
+    EXPECT_TRUE(this->list.remove(last)) << "not the first equal one";
+    this->expectRanks("1 2", "2 1");
+    typename TestFixture::Element equal(1);
+    EXPECT_FALSE(this->list.remove(&equal));
 }
 
 TYPED_TEST(IntrusiveListTest, CopyOfSharedElementsIsEmpty)

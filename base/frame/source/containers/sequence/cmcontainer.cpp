@@ -175,6 +175,11 @@ bool CmContainer::addRestored(CmObject* element)
 
 bool CmContainer::query(CmObjectFilter& filter, CmContainer& result) const
 {
+    if (&result == this)
+    {
+        const CmArray elements = elementsOf(*this);
+        return elements.query(filter, result);
+    }
     bool hasPassed = false;
     for (IteratorHolder it = iterate(*this); !it->done();)
     {
