@@ -1,8 +1,13 @@
 // Walks over every class that the program registers: a declaration that was forgotten or copied shows here.
 
+#include "containers/value/idate.h"
+#include "containers/value/itime.h"
+#include "foundation/message/fmessenger.h"
+#include "foundation/message/imessage.h"
 #include "foundation/object/classfactory.h"
 #include "foundation/object/cmobject.h"
 #include "foundation/object/iptr.h"
+#include "storage/path/ipath.h"
 
 #include <gtest/gtest.h>
 
@@ -12,7 +17,6 @@
 #include <memory>
 #include <string>
 #include <typeinfo>
-#include <vector>
 
 namespace
 {
@@ -27,12 +31,28 @@ std::string languageName(const CmObject& object)
     return colon == std::string::npos ? name : name.substr(colon + 2);
 }
 
-std::vector<const MetaClass*> namedClasses()
+TArray<const MetaClass*> classes(bool named)
 {
-    std::vector<const MetaClass*> result;
-    ClassFactory::instance(true)->forEachNamedClass([&result](const MetaClass& meta)
-                                                    { result.push_back(&meta); });
+    TArray<const MetaClass*> all, result;
+    ClassFactory::instance(true)->listClasses(all);
+    for (const MetaClass* meta : all)
+        if ((meta->className != nullptr) == named)
+            result.add(meta);
     return result;
+}
+
+/// Whether the factory has, for this identifier alone, a descriptor whose objects offer the interface.
+bool isMadeByIdentifier(const MetaClass& meta)
+{
+    const FUID& iid = meta.classID;
+    const IPtr<FUnknown> object = adopt(ClassFactory::instance(true)->createObjectByID(iid));
+    void* view = nullptr;
+    if (!object || object->queryInterface(iid, &view) != kResultOk)
+        return false;
+    // One reference of the maker and one of the query.
+    const bool isFresh = object->release() == 1;
+    object->addRef();
+    return isFresh && view == object.get();
 }
 
 void expectDeclaredAs(CmObject& object, const MetaClass& meta)
@@ -66,7 +86,7 @@ void expectCopiesToItsOwnClass(const CmObject& object)
 TEST(AllClasses, AreWhatTheySay)
 {
     int made = 0;
-    for (const MetaClass* meta : namedClasses())
+    for (const MetaClass* meta : classes(true))
     {
         SCOPED_TRACE(meta->className);
         const IPtr<FUnknown> unknown = adopt(meta->createFunction ? meta->createFunction() : nullptr);
@@ -84,7 +104,7 @@ TEST(AllClasses, AreWhatTheySay)
 
 TEST(AllClasses, HaveNamesOfTheirOwn)
 {
-    for (const MetaClass* meta : namedClasses())
+    for (const MetaClass* meta : classes(true))
     {
         SCOPED_TRACE(meta->className);
         EXPECT_EQ(ClassFactory::instance(true)->getMetaClassByName(meta->className), meta)
@@ -92,4 +112,33 @@ TEST(AllClasses, HaveNamesOfTheirOwn)
         EXPECT_TRUE(meta->createFunction || meta->baseClass);
         EXPECT_TRUE(meta->isTypeOf(meta->className));
     }
+}
+
+TEST(AllClasses, AreMadeByTheInterfaceThatTheyStandFor)
+{
+    TArray<FUID> fresh;
+    for (const FUID* iid : {&IDate::iid, &ITime::iid, &IPath::iid, &IMessage::iid})
+        fresh.add(*iid);
+    int made = 0;
+    for (const MetaClass* meta : classes(false))
+    {
+        EXPECT_TRUE(meta->classID.isValid() && !meta->baseClass && meta->classVersion == 0);
+        if (!fresh.contains(meta->classID))
+            continue;
+        EXPECT_TRUE(isMadeByIdentifier(*meta)) << made;
+        made++;
+    }
+    EXPECT_EQ(made, fresh.total());
+}
+
+TEST(AllClasses, HandOutTheOneServiceOfTheProcess)
+{
+    const ClassFactory& factory = *ClassFactory::instance(true);
+    EXPECT_EQ(factory.createObjectByID(IMessenger::iid), nullptr) << "while there is none";
+    FMessenger messenger;
+    gMessenger = &messenger;
+    const IPtr<FUnknown> service = adopt(factory.createObjectByID(IMessenger::iid));
+    gMessenger = nullptr;
+    EXPECT_EQ(service.get(), static_cast<IMessenger*>(&messenger));
+    EXPECT_EQ(messenger.getRefCount(), 2u);
 }

@@ -59,13 +59,14 @@ public:
     }
     int32 getClassID(char* uid) override
     {
-        kComponentID.toTUID(uid);
+        classID.toTUID(uid);
         return hasClassID ? kResultOk : kNoInterface;
     }
     int32 saveAttributes(IAttributes*) override { return kResultOk; }
     int32 loadAttributes(IAttributes*) override { return kResultOk; }
 
     uint32 references = 1;
+    FUID classID = kComponentID;
     bool hasClassID = true;
 };
 
@@ -91,6 +92,22 @@ DEFINE_ABSTRACT_CLASS(Abstract, CmObject)
 class Undescribed : public CmObject
 {
     DECLARE_COPYABLE(Undescribed, CmObject)
+};
+
+/// Answers for a component as well.
+class UndescribedComponent : public Undescribed
+{
+    DECLARE_COPYABLE(UndescribedComponent, Undescribed)
+
+    int32 queryInterface(const char* interfaceID, void** object) override
+    {
+        if (isSameInterface(interfaceID, IPersistent::iid))
+        {
+            *object = static_cast<IPersistent*>(new Component);
+            return kResultOk;
+        }
+        return Undescribed::queryInterface(interfaceID, object);
+    }
 };
 
 MetaClass componentClass(nullptr, makeComponent, kComponentID, nullptr, 0);
@@ -186,6 +203,18 @@ TEST(ClassFactory, NamesComponentsByTheirIdentifier)
     Component component;
     EXPECT_TRUE(factory().getStorageID(&component, result, true));
     EXPECT_EQ(result.text, "5EED0001111122223333444455556666");
+
+    // An FObject that the factory doesn't know by name is still known by its identifier.
+    UndescribedComponent undescribed;
+    EXPECT_TRUE(factory().getStorageID(&undescribed, result, false));
+    EXPECT_EQ(result.text, "UndescribedComponent");
+    EXPECT_TRUE(factory().getStorageID(&undescribed, result, true));
+    EXPECT_EQ(result.text, "5EED0001111122223333444455556666");
+
+    component.classID = FUID(1, 2, 3, 4);
+    EXPECT_FALSE(factory().getStorageID(&component, result, true)) << "nobody could make it";
+    EXPECT_TRUE(factory().getStorageID(&component, result, false));
+    EXPECT_EQ(result.text, "00000001000000020000000300000004");
     component.hasClassID = false;
     EXPECT_FALSE(factory().getStorageID(&component, result, false));
     EXPECT_EQ(component.references, 1u);

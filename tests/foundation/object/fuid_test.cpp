@@ -1,5 +1,9 @@
 #include "foundation/object/cmuid.h"
-#include "foundation/object/idependent.h"
+#include "foundation/object/iattributes.h"
+#include "foundation/object/icloneable.h"
+#include "foundation/object/ipersistent.h"
+#include "foundation/object/istring.h"
+#include "foundation/object/iupdatehandler.h"
 #include "foundation/text/string.h"
 
 #include <gtest/gtest.h>
@@ -113,7 +117,13 @@ TEST(FUID, GeneratesDistinctRandomIdentifiersOfVersion4)
 TEST(FUID, InterfacesHaveTheirPublishedIdentifiers)
 {
     EXPECT_EQ(digitsOf(FUnknown::iid), "0000000000000000C000000000000046");
+    EXPECT_EQ(digitsOf(IString::iid), "F99DB7A30FC14821800B0CF98E348EDF");
+    EXPECT_EQ(digitsOf(IStringResult::iid), "550798BC872049DB84920A153B50B7A8");
     EXPECT_EQ(digitsOf(IDependent::iid), "F52B7AAEDE72416D8AF18ACE9DD7BD5E");
+    EXPECT_EQ(digitsOf(IUpdateHandler::iid), "F5246D5686544D60B026AFB57B697B37");
+    EXPECT_EQ(digitsOf(IPersistent::iid), "BA1A46373C9F46D0A65DBA0EB85DA829");
+    EXPECT_EQ(digitsOf(IAttributes::iid), "FA1E32F9CA6D46F5A982F956B1191B58");
+    EXPECT_EQ(digitsOf(ICloneable::iid), "D45406B93A2D44439DAD9BA985A1454B");
 }
 
 TEST(CmUID, LongStringTakesWhatDigitsThereAre)
@@ -140,6 +150,10 @@ TEST(CmUID, ShortStringCutsBitsFromTheLeastSignificantOn)
     EXPECT_STREQ(text, "0V000000000000000000000000");
     CmUID(FUID(0xFFFFFFFF, 0xFFFFFFFF, 0xFFFFFFFF, 0xFFFFFFFF)).toShortString(text);
     EXPECT_STREQ(text, "VVVVVVVVVVVVVVVVVVVVVVVVV7");
+
+    CmUID lacking(kSample);
+    EXPECT_TRUE(lacking.fromShortString("V7"));
+    EXPECT_EQ(lacking, CmUID(FUID(0xFF000000, 0, 0, 0)));
 
     for (int i = 0; i < 50; i++)
     {

@@ -8,14 +8,7 @@
 
 DEFINE_CLASS(CmDate, CmObject)
 
-namespace Meta
-{
-static FUnknown* makeIDateCmDate()
-{
-    return static_cast<IDate*>(new CmDate);
-}
-static MetaClass metaIDateCmDate(nullptr, &makeIDateCmDate, IDate::iid, nullptr, 0);
-} // namespace Meta
+DEFINE_INTERFACE_CLASS(IDate, CmDate)
 
 namespace
 {

@@ -8,14 +8,7 @@ DEFINE_CLASS(CmTime, CmObject)
 
 const CmDate CmTime::refDate(0u, 0u);
 
-namespace Meta
-{
-static FUnknown* makeITimeCmTime()
-{
-    return static_cast<ITime*>(new CmTime);
-}
-static MetaClass metaITimeCmTime(nullptr, &makeITimeCmTime, ITime::iid, nullptr, 0);
-} // namespace Meta
+DEFINE_INTERFACE_CLASS(ITime, CmTime)
 
 namespace
 {

@@ -13,6 +13,8 @@ DEFINE_INTERFACE_ID(IMessenger, 0x27A9E06D, 0xB5184C3F, 0x8E72D4F1, 0x0C963A5B)
 
 FGlobalMessenger gMessenger;
 
+DEFINE_INTERFACE_HOST(IMessenger, gMessenger)
+
 namespace
 {
 // The flag value that the names are built with: pages of a few entries, as there are few names.

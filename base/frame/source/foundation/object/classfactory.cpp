@@ -6,6 +6,7 @@
 #include "foundation/object/metaclasstables.h"
 #include "foundation/object/singleton.h"
 
+using MetaClasses::SorterByCID;
 using MetaClasses::SorterByName;
 
 namespace
@@ -104,8 +105,11 @@ bool ClassFactory::getStorageID(FUnknown* object, IString& result, bool mustBeRe
     return true;
 }
 
-void ClassFactory::forEachNamedClass(const std::function<void(const MetaClass&)>& visit) const
+void ClassFactory::listClasses(TArray<const MetaClass*>& result) const
 {
     for (THashTableIterator<SorterByName> it(tables->byName); !it.done();)
-        visit(*it.next().meta);
+        result.add(it.next().meta);
+    for (THashTableIterator<SorterByCID> it(tables->byID); !it.done(); it.next())
+        if (!it.current().meta->className)
+            result.add(it.current().meta);
 }

@@ -1,9 +1,9 @@
 #pragma once
 
+#include "containers/typed/tarray.h"
 #include "foundation/object/fobject.h"
 #include "foundation/object/istring.h"
 
-#include <functional>
 #include <memory>
 
 namespace MetaClasses
@@ -40,8 +40,8 @@ class ClassFactory : public FObject
     /// offers IPersistent. False where it has none, or with `mustBeRegistered` none that the factory knows.
     bool getStorageID(FUnknown* object, IString& result, bool mustBeRegistered) const;
 
-    /// Calls `visit` for every descriptor that has a name.
-    void forEachNamedClass(const std::function<void(const MetaClass&)>& visit) const;
+    /// Adds every descriptor, those with a name first; borrowed.
+    void listClasses(TArray<const MetaClass*>& result) const;
 
 private:
     ClassFactory();

@@ -115,3 +115,33 @@ public:                                                                         
         return static_cast<CmObject*>(new Class);                                                            \
     }
 #define DEFINE_CLASS(Class, Base) DEFINE_CLASS_VERSION(Class, Base, 0)
+
+// Interfaces that callers get by their identifier alone, through ClassFactory::createObjectByID. The descriptor has no
+// name. The definition stands in the source of the class that implements the interface.
+
+/// Each request makes a new `Implementer`.
+#define DEFINE_INTERFACE_CLASS(Interface, Implementer)                                                       \
+    namespace Meta                                                                                           \
+    {                                                                                                        \
+    static FUnknown* make##Interface##Implementer()                                                          \
+    {                                                                                                        \
+        return static_cast<Interface*>(new Implementer);                                                     \
+    }                                                                                                        \
+    static MetaClass meta##Interface##Implementer(nullptr, &make##Interface##Implementer, Interface::iid,    \
+                                                  nullptr, 0);                                               \
+    }
+
+/// Each request gives the one object that `global` points at, with a reference; null while there is none.
+#define DEFINE_INTERFACE_HOST(Interface, global)                                                             \
+    namespace Meta                                                                                           \
+    {                                                                                                        \
+    static FUnknown* createHost##Interface()                                                                 \
+    {                                                                                                        \
+        Interface* host = global;                                                                            \
+        if (host)                                                                                            \
+            host->addRef();                                                                                  \
+        return host;                                                                                         \
+    }                                                                                                        \
+    static MetaClass meta##Interface##HostClass(nullptr, &createHost##Interface, Interface::iid, nullptr,    \
+                                                0);                                                          \
+    }

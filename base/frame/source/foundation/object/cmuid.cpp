@@ -70,7 +70,7 @@ int CmUID::toShortString(char* out) const
 bool CmUID::fromShortString(const char* text)
 {
     unsigned char bytes[kByteCount] = {};
-    for (int bit = 0; bit < kBitCount; bit++)
+    for (int bit = 0; bit < kBitCount && text[bit / kGroupBits]; bit++)
         if ((shortValue(text[bit / kGroupBits]) >> (bit % kGroupBits)) & 1)
             bytes[bit / 8] = static_cast<unsigned char>(bytes[bit / 8] | (1 << (bit % 8)));
     for (int i = 0; i < kByteCount; i++)

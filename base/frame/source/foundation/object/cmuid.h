@@ -32,7 +32,7 @@ class CmUID : public CmObject, public FUID
     void toFString(String& text) const;
     /// Writes 26 characters and a terminator; the result is 26.
     int toShortString(char* out) const;
-    /// Reads 26 characters unchecked. Always true.
+    /// Reads 26 characters unchecked; what a shorter text lacks is 0. Always true.
     bool fromShortString(const char* text);
 
     bool isEqual(const CmObject* other) const override;

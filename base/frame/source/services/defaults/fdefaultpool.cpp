@@ -11,6 +11,8 @@ DEFINE_CLASS(FDefaultPool, CmObject)
 
 FDefaultPool* gDefaultPool = nullptr;
 
+DEFINE_INTERFACE_HOST(IDefaultPool, gDefaultPool)
+
 namespace
 {
 constexpr const char16* kFileName = u"Defaults";

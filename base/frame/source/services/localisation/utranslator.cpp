@@ -24,6 +24,8 @@ DEFINE_INTERFACE_ID(ITranslator, 0x8B93D05E, 0x21FC4C7A, 0xA4087E19, 0x6D52B3C0)
 
 UTranslator* gTranslator = nullptr;
 
+DEFINE_INTERFACE_HOST(ITranslator, gTranslator)
+
 namespace
 {
 const UTranslatedString stringYouMustRestartTheApplication("You must restart the application.");

@@ -6,6 +6,7 @@
 #include <cstring>
 
 DEFINE_CLASS(FNPath, FPath)
+DEFINE_INTERFACE_CLASS(IPath, FNPath)
 
 bool FNPath::storeAttrFileType = false;
 
