@@ -7,8 +7,8 @@
 /// between that container and them, and is no class of the object model.
 ///
 /// Keys are unique. In modes 1 and 2 key and object are released when they leave; the association is the
-/// dictionary's own in every mode. Beware: in mode 2 `add` gives key and object no reference, so use modes 0 and 1. One thread at
-/// a time.
+/// dictionary's own in every mode. Beware: in mode 2 `add` gives key and object no reference, so use modes 0 and 1.
+/// One thread at a time.
 template <class Container>
 class CmDictionaryOf : public Container
 {

@@ -11,8 +11,8 @@
 
 /// What the array templates share: places, growth and removal. Where a new element goes, `shouldGo` decides.
 ///
-/// Growth when full: step 0 never grows, so `add` then fails; step -1 doubles (10 at first); any other is added. One thread at a
-/// time, as all that follows here.
+/// Growth when full: step 0 never grows, so `add` then fails; step -1 doubles (10 at first); any other is added.
+/// One thread at a time, as all that follows here.
 template <class T>
 class TArrayBase : public TContainer<T>
 {

@@ -15,8 +15,8 @@
 //
 // A declaration stands first in its class and leaves the access at `public`. Its definition stands in the class's
 // source. `Base` is the direct base through which the class descends from FObject; naming another one, in either
-// place, or copying the line from another class does not compile. Classes that are stored in a changed form since their first
-// version are defined by DEFINE_CLASS_VERSION.
+// place, or copying the line from another class does not compile. Classes that are stored in a changed form since
+// their first version are defined by DEFINE_CLASS_VERSION.
 
 /// What the check of a declared base hands around; never made.
 template <class T>

@@ -22,12 +22,3 @@ unsigned CmString::hash(unsigned size) const
 {
     return isWide ? hashString16(ConstString::text16(), size) : hashString8(ConstString::text8(), size);
 }
-
-int32 CmString::queryInterface(const char* interfaceID, void** object)
-{
-    if (isSameInterface(interfaceID, IString::iid))
-        return offerInterface<IString>(this, object);
-    if (isSameInterface(interfaceID, IStringResult::iid))
-        return offerInterface<IStringResult>(this, object);
-    return CmObject::queryInterface(interfaceID, object);
-}

@@ -1,8 +1,8 @@
 #pragma once
 
 #include "foundation/object/cmobject.h"
-#include "foundation/object/istring.h"
 #include "foundation/text/fstring.h"
+#include "foundation/text/ttextobject.h"
 
 class CmContainer;
 
@@ -10,18 +10,13 @@ class CmContainer;
 ///
 /// Texts are equal, ordered and hashed by their characters; equal texts of different width have different hashes,
 /// so settle on one width in a table. One thread at a time.
-class CmString : public CmObject, public FString, public IStringResult, public IString
+class CmString : public TTextObject<CmObject, FString>
 {
     DECLARE_CLASS(CmString, CmObject)
 
-    using FString::FString;
-    using FString::operator=;
-    CmString() = default;
-    CmString(const CmString&) = default;
-    CmString& operator=(const CmString&) = default;
-
+    using TTextObject::TTextObject;
+    using TTextObject::operator=;
     using FString::compare;
-    using FString::take;
 
     /// Cuts `text` at each delimiter and adds the pieces as CmStrings to `result`, which owns them.
     /// Empty pieces are dropped, but for the last one, which is kept unless `dropEmptyLast`. `trim` cuts white
@@ -40,15 +35,4 @@ class CmString : public CmObject, public FString, public IStringResult, public I
     bool externalize(FArchive& archive) const override;
     bool storeAttributes(FAttributes& attributes) const override;
     bool restoreAttributes(FAttributes& attributes) override;
-
-    int32 queryInterface(const char* interfaceID, void** object) override;
-    void setText(const char* text) override { assign(text); }
-    void setText8(const char* text) override { assign(text); }
-    void setText16(const char16* text) override { assign(text); }
-    const char* getText8() override { return text8(); }
-    const char16* getText16() override { return text16(); }
-    void take(void* text, bool wide) override { FString::take(text, wide); }
-    bool isWideString() const override { return FString::isWideString(); }
-
-    FORWARD_FUNKNOWN(CmObject)
 };
