@@ -8,7 +8,7 @@
 class FNFileSystem;
 
 /// Raises the mount events of the file system: it compares the volumes with those of before. Main thread.
-class VolumeWatch : private IVolumeListener
+class VolumeWatch final : private IVolumeListener
 {
 public:
     /// `owner` is borrowed, and gets the events until the watch goes.
