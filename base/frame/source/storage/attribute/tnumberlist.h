@@ -4,7 +4,7 @@
 
 #include <vector>
 
-/// What the queues of numbers have in common. One thread at a time.
+/// What the queues of numbers have in common; no class of the object model. One thread at a time.
 template <class T>
 class TNumberList : public FAttrList
 {
