@@ -1,0 +1,3 @@
+#include "services/presets/fpresetitem.h"
+
+DEFINE_ABSTRACT_CLASS(FPresetItem, CmObject)

@@ -1,0 +1,3 @@
+#include "services/presets/fpresetlistownfile.h"
+
+DEFINE_CLASS(FPresetListOwnFile, FPresetList)
