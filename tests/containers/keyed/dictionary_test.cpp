@@ -168,6 +168,8 @@ TYPED_TEST(DictionaryTest, CopiesHaveTheirOwnAssociations)
         EXPECT_EQ(rankOf(copied.lookup(&key)), 20);
         copied = owning;
         EXPECT_EQ(copied.total(), 3);
+        EXPECT_FALSE(copied.addAllFrom(&owning)) << "the keys are present";
+        EXPECT_EQ(Item::alive, 13) << "refused copies must go";
     }
     for (int16 mode : {CmContainer::kShared, CmContainer::kRetained})
     {

@@ -120,6 +120,11 @@ TEST(CmHashTable, UsesItsOwnHashFunction)
     EXPECT_EQ(ranksOf(table), "0 1 2 3 4 5");
     const CmHashTable copied(table);
     EXPECT_EQ(ranksOf(copied), "0 1 2 3 4 5") << "a copy hashes alike";
+    CmHashTable growing;
+    growing.setAutoResize(true);
+    CmHashTable alsoGrowing(growing);
+    fill(alsoGrowing, 21);
+    EXPECT_EQ(alsoGrowing.size(), 100);
     CmHashTable none(0);
     EXPECT_FALSE(none.add(table.at(0)));
     EXPECT_FALSE(none.contains(table.at(0)));

@@ -122,6 +122,7 @@ TEST(CmArray, PlacesInASortedStretch)
     EXPECT_EQ(placeOf(35, 0, 3), 5) << "above the stretch is the end of the array";
     EXPECT_EQ(placeOf(15, 1, 3), 1);
     EXPECT_EQ(placeOf(25, 0, 99), 3);
+    EXPECT_EQ(placeOf(25, 0, 0), 3) << "an end below 1 is the last element";
     EXPECT_EQ(CmArray().shouldGo(array.at(0), 0, -1), 0);
 }
 
@@ -148,6 +149,37 @@ TEST(CmArray, MergesSortedArrays)
     CmArray fixed(1, 0);
     EXPECT_FALSE(fixed.mergeSorted(other));
     EXPECT_TRUE(fixed.isEmpty());
+}
+
+TEST(CmArray, CountsAReferenceForEveryWayIntoMode2)
+{
+    Item one(1), two(2), three(3);
+    CmArray array, other;
+    array.retainElements();
+    array.add(&one);
+    EXPECT_TRUE(array.replaceAt(0, &two));
+    EXPECT_EQ(one.getRefCount(), 1u);
+    EXPECT_EQ(two.getRefCount(), 2u);
+    other.add(&one);
+    other.add(&three);
+    EXPECT_TRUE(array.mergeSorted(other));
+    EXPECT_EQ(ranksOf(array), "1 2 3");
+    for (const Item* item : {&one, &two, &three})
+        EXPECT_EQ(item->getRefCount(), 2u) << item->rank;
+}
+
+TEST(CmArray, KeepsNothingOfWhatItRefuses)
+{
+    CmArray source, fixed(1, 0);
+    addItems(source, "abc", {1, 2, 3});
+    fixed.takeElements();
+    EXPECT_FALSE(fixed.addAllFrom(&source));
+    EXPECT_EQ(Item::alive, 4) << "copies that found no place must go";
+    fixed.removeAll();
+    EXPECT_FALSE(fixed.takeAllFrom(&source, true));
+    EXPECT_EQ(source.at(0)->getRefCount(), 2u);
+    EXPECT_EQ(source.at(1)->getRefCount(), 1u);
+    EXPECT_EQ(fixed.getOwnership(), 1);
 }
 
 TEST(CmArray, SortsByCompare)

@@ -11,6 +11,7 @@
 #include "containers/sequence/cmqueue.h"
 #include "containers/sequence/cmstack.h"
 #include "foundation/object/iptr.h"
+#include "foundation/thread/fcpuinfo.h"
 
 #include <gtest/gtest.h>
 
@@ -373,4 +374,39 @@ TEST(ConcurrentIteration, LowersTheNumberOfThreadsToTheWork)
     EXPECT_FALSE(array.concurrentIteration(filter, 8, 10));
     EXPECT_TRUE(filter.hasCheckedEachOnce());
     EXPECT_EQ(filter.callers.size(), 2u);
+}
+
+namespace
+{
+/// Passes nothing.
+class RefusingFilter : public CmObjectFilter
+{
+public:
+    bool check(CmObject*) override
+    {
+        asked++;
+        return false;
+    }
+
+    std::atomic<int> asked{0};
+};
+} // namespace
+
+TEST(ConcurrentIteration, EveryThreadEndsAfterARefusal)
+{
+    CmArray array;
+    fill(array, 100);
+    RefusingFilter refusing;
+    EXPECT_TRUE(array.concurrentIteration(refusing, 4, 1));
+    EXPECT_LE(refusing.asked, 4) << "one for each thread at most";
+}
+
+TEST(ConcurrentIteration, TakesAllProcessorsByDefault)
+{
+    CmArray array;
+    fill(array, 1000);
+    CoverageFilter filter(1000);
+    const bool isAlone = FCpuInfo().countAvailable() < 2;
+    EXPECT_EQ(array.concurrentIteration(filter, 0, 1), isAlone);
+    EXPECT_TRUE(filter.hasCheckedEachOnce());
 }

@@ -109,6 +109,9 @@ TYPED_TEST(ListTest, ReplacesAndSorts)
     for (int rank : {3, 1, 2, 1, 3})
         EXPECT_TRUE(this->list.addSorted(this->make(rank)));
     this->expectRanks("1 1 2 3 3", "3 3 2 1 1");
+    auto* equal = this->make(2);
+    EXPECT_TRUE(this->list.addSorted(equal));
+    EXPECT_EQ(this->list.at(3), equal) << "behind its equals";
 }
 
 TEST(CmLinkedList, AddsPointersWithoutCopies)
@@ -167,16 +170,22 @@ TYPED_TEST(IntrusiveListTest, MovesWholeLists)
     this->expectRanks("1 2 3 4", "4 3 2 1");
     EXPECT_TRUE(other.isEmpty());
     other.add(this->make(5));
+    other.retainElements();
     this->list.prependList(other);
+    EXPECT_EQ(this->list.getOwnership(), 1) << "the modes stay";
+    EXPECT_EQ(other.getOwnership(), 2);
     this->list.prependList(other);
     this->list.appendList(this->list);
     this->expectRanks("5 1 2 3 4", "4 3 2 1 5");
 
     other.add(this->make(6));
     other.swap(this->list);
+    EXPECT_EQ(this->list.getOwnership(), 2) << "the modes go with the elements";
+    this->list.first()->release();
     this->expectRanks("6", "6");
     EXPECT_EQ(ranksOf(other), "5 1 2 3 4");
     this->list.takeOver(other);
+    EXPECT_EQ(this->list.getOwnership(), 1);
     this->expectRanks("5 1 2 3 4", "4 3 2 1 5");
     EXPECT_TRUE(other.isEmpty());
     other.appendList(this->list);

@@ -122,9 +122,14 @@ class CountingModule : public FModule
 {
 public:
     void addInstance(FUnknown*) override { instances++; }
-    void releaseInstance(FUnknown*) override { instances--; }
+    void releaseInstance(FUnknown*) override
+    {
+        instances--;
+        EXPECT_TRUE(!component || component->references == 1) << "the delegate goes while its code is there";
+    }
 
     int instances = 0;
+    const Component* component = nullptr;
 };
 } // namespace
 
@@ -158,6 +163,7 @@ TEST(ClassFactory, MakesObjectsByIdentifier)
     EXPECT_EQ(factory().createObjectByName("5EED000111112222333344445555666"), nullptr);
     EXPECT_EQ(factory().createObjectByName("00000000000000000000000000000000"), nullptr);
     EXPECT_EQ(factory().createObjectByID(FUID(1, 2, 3, 4)), nullptr);
+    EXPECT_EQ(factory().getMetaClassByID(FUID()), nullptr) << "no identifier is none";
 }
 
 TEST(ClassFactory, AliasStandsForItsTarget)
@@ -267,6 +273,9 @@ TEST(CmDelegatingUnknown, EqualsByModuleAndHoldsIt)
     }
     EXPECT_EQ(module.instances, 0);
     EXPECT_EQ(otherModule.instances, 0);
+    Component last;
+    module.component = &last;
+    CmDelegatingUnknown(&last, &module);
 }
 
 namespace

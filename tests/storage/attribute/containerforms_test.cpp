@@ -56,6 +56,20 @@ bool throughAttributes(const CmObject& object, CmObject& target)
 }
 } // namespace
 
+TEST(CmObjectForms, StoreNothing)
+{
+    CmObject object;
+    FAttributes attributes;
+    EXPECT_FALSE(object.storeAttributes(attributes));
+    EXPECT_FALSE(object.restoreAttributes(attributes));
+    FMemoryStream stream;
+    FNewArchive archive(&stream, true);
+    const int64 size = stream.getSize();
+    EXPECT_TRUE(object.externalize(archive));
+    EXPECT_TRUE(object.internalize(archive));
+    EXPECT_EQ(stream.getSize(), size);
+}
+
 TEST(ContainerForms, ComeBackWithModeAndElements)
 {
     CmArray array;
@@ -138,6 +152,40 @@ TEST(DictionaryForms, ComeBackUnderTheirKeys)
         EXPECT_STREQ(static_cast<CmString*>(restored->lookup(&key))->text8(), "value");
         EXPECT_TRUE(restored->contains(&uid));
     }
+}
+
+TEST(DictionaryForms, HalfAPairIsNone)
+{
+    const IPtr<CmString> text = adopt(new CmString("text"));
+    for (const char* key : {"Key", "Obj"})
+    {
+        FAttributes attributes;
+        attributes.setObject(key, text);
+        const unsigned references = text->getRefCount();
+        CmAssociation restored;
+        EXPECT_FALSE(restored.restoreAttributes(attributes));
+        EXPECT_TRUE(!restored.getKey() && !restored.getObject());
+        EXPECT_EQ(text->getRefCount(), references);
+    }
+}
+
+TEST(DictionaryForms, ARestoredPairGoesOverToItsDictionary)
+{
+    const IPtr<CmString> key = adopt(new CmString("key")), object = adopt(new CmString("object"));
+    FAttributes attributes;
+    CmAssociation(key, object).storeAttributes(attributes);
+    const unsigned references = key->getRefCount();
+    {
+        CmHashDictionary dictionary;
+        dictionary.takeElements();
+        auto* restored = new CmAssociation;
+        EXPECT_TRUE(restored->restoreAttributes(attributes));
+        EXPECT_EQ(restored->getObject(), object.get());
+        EXPECT_TRUE(dictionary.add(restored));
+        EXPECT_EQ(key->getRefCount(), references + 1);
+    }
+    EXPECT_EQ(key->getRefCount(), references) << "released once, by the dictionary";
+    EXPECT_EQ(object->getRefCount(), references);
 }
 
 TEST(CmUIDForms, AreItsDigits)
