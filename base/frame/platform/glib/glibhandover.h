@@ -4,7 +4,7 @@
 
 #include <string>
 
-/// Gets what the processes of this program were started with.
+/// Gets what the processes of this program were started with. Main thread.
 class IArgumentReceiver
 {
 public:

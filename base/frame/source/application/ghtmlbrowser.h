@@ -2,7 +2,7 @@
 
 #include "foundation/object/types.h"
 
-/// Something that shows web pages in place of the desktop's browser.
+/// Something that shows web pages in place of the desktop's browser. Thread-safe.
 class ICustomBrowser
 {
 public:
@@ -13,7 +13,6 @@ public:
         kFailed
     };
 
-    /// May be called by any thread.
     virtual Answer openURL(const char16* url) = 0;
 
 protected:

@@ -2,7 +2,7 @@
 
 #include "foundation/object/funknown.h"
 
-/// Identifies the controller of the application to components.
+/// Identifies the controller of the application to components. Main thread.
 class IPlatform2 : public FUnknown
 {
 public:

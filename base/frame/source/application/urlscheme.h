@@ -1,6 +1,6 @@
 #pragma once
 
-/// Takes URLs that the desktop hands to this process.
+/// Takes URLs that the desktop hands to this process. Main thread.
 class IURLSchemeHandler
 {
 public:

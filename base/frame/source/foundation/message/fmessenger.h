@@ -13,7 +13,7 @@
 
 class FMessage;
 
-/// Takes messages that go to a name on to other processes. Called by any thread, with no lock held.
+/// Takes messages that go to a name on to other processes. Thread-safe; called with no lock held.
 class INetworkMessenger
 {
 public:

@@ -7,7 +7,8 @@ class String;
 
 /// A named message that carries values by name.
 ///
-/// Texts are copied; objects are held by reference. What a getter returns belongs to the message.
+/// Texts are copied; objects are held by reference. What a getter returns belongs to the message. One thread at a
+/// time.
 class IMessage : public FUnknown
 {
 public:
@@ -31,7 +32,7 @@ public:
     DECLARE_INTERFACE_ID
 };
 
-/// Adds texts of either width.
+/// Adds texts of either width. One thread at a time.
 class IMessage2 : public IMessage
 {
 public:

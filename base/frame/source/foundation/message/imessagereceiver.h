@@ -4,7 +4,8 @@
 
 class IMessage;
 
-/// Somebody outside the class tree who takes messages.
+/// Somebody outside the class tree who takes messages, on the main thread when they
+/// were posted.
 class IMessageReceiver : public FUnknown
 {
 public:

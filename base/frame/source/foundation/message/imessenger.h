@@ -6,6 +6,7 @@ class IMessage;
 class IMessageReceiver;
 
 /// Posting as components see it. A receiver is not held: it takes back its messages before it goes.
+/// Posting is thread-safe; all else belongs to the main thread.
 class IMessenger : public FUnknown
 {
 public:

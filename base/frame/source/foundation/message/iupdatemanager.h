@@ -3,6 +3,7 @@
 #include "foundation/object/funknown.h"
 
 /// What the owner of the idle pulse does with deferred changes. Results: 0, or 1 for an unusable argument.
+/// Thread-safe.
 class IUpdateManager : public FUnknown
 {
 public:

@@ -2,7 +2,7 @@
 
 #include "foundation/thread/flock.h"
 
-/// Holds a lock to the end of a scope.
+/// Holds a lock to the end of a scope. One thread at a time.
 class [[nodiscard]] FLockScope
 {
 public:

@@ -25,7 +25,8 @@ enum FThreadPriority : int32
     kThreadPriorityHighest = 5
 };
 
-/// Watches threads come and go, for debugging. Called on whatever thread makes or deletes the object.
+/// Watches threads come and go, for debugging. Thread-safe: called on whatever thread makes or deletes the
+/// object.
 class IThreadSpy
 {
 public:
