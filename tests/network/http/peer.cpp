@@ -6,43 +6,14 @@
 
 #include <algorithm>
 
-#include <arpa/inet.h>
-#include <poll.h>
-#include <sys/socket.h>
-#include <unistd.h>
-
 namespace
 {
-sockaddr_in loopback(int port)
-{
-    sockaddr_in address{};
-    address.sin_family = AF_INET;
-    address.sin_port = htons(static_cast<uint16_t>(port));
-    address.sin_addr.s_addr = htonl(INADDR_LOOPBACK);
-    return address;
+constexpr const char* kLoopback = "127.0.0.1";
 }
 
-int makeSocket()
+Peer::Peer(Script peerScript) : script(std::move(peerScript))
 {
-    return socket(AF_INET, SOCK_STREAM | SOCK_CLOEXEC, 0);
-}
-
-/// Binds to a port that the system chooses, and gives it.
-int bindAnywhere(int handle)
-{
-    sockaddr_in address = loopback(0);
-    socklen_t size = sizeof address;
-    EXPECT_EQ(bind(handle, reinterpret_cast<sockaddr*>(&address), size), 0);
-    EXPECT_EQ(getsockname(handle, reinterpret_cast<sockaddr*>(&address), &size), 0);
-    return ntohs(address.sin_port);
-}
-} // namespace
-
-Peer::Peer(Script peerScript) : script(std::move(peerScript)), listener(makeSocket())
-{
-    number = bindAnywhere(listener);
-    EXPECT_EQ(listen(listener, 16), 0);
-    EXPECT_EQ(pipe(endPipe), 0);
+    EXPECT_TRUE(server.setAddress(kLoopback) && server.open());
     thread = std::thread([this] { serve(); });
 }
 
@@ -54,15 +25,19 @@ Peer::Peer(std::vector<std::string> answers)
 
 Peer::~Peer()
 {
-    EXPECT_EQ(write(endPipe[1], "x", 1), 1);
+    server.stop();
+    {
+        std::lock_guard<std::mutex> guard(mutex);
+        isEnding = true;
+        if (current)
+            current->cancel();
+    }
     thread.join();
-    for (const int handle : {listener, endPipe[0], endPipe[1]})
-        close(handle);
 }
 
 std::string Peer::url(const std::string& rest) const
 {
-    return "http://127.0.0.1:" + std::to_string(number) + rest;
+    return std::string("http://") + kLoopback + ":" + std::to_string(port()) + rest;
 }
 
 std::vector<std::string> Peer::requests() const
@@ -76,28 +51,32 @@ void Peer::waitForRequest() const
     EXPECT_TRUE(waitUntil([this] { return !requests().empty(); })) << "nobody asks";
 }
 
-bool Peer::awaitInput(int handle) const
-{
-    pollfd waited[] = {{handle, POLLIN, 0}, {endPipe[0], POLLIN, 0}};
-    poll(waited, 2, -1);
-    return waited[1].revents == 0;
-}
-
 void Peer::serve()
 {
-    while (awaitInput(listener))
+    while (const auto connection = adopt(server.waitForConnection()))
     {
-        const int connection = accept(listener, nullptr, nullptr);
-        answer(connection);
-        close(connection);
+        {
+            std::lock_guard<std::mutex> guard(mutex);
+            if (isEnding)
+                return;
+            current = connection;
+        }
+        answer(*connection);
+        std::lock_guard<std::mutex> guard(mutex);
+        current = nullptr;
     }
 }
 
-void Peer::answer(int connection)
+void Peer::answer(NStream& connection)
 {
     std::string request;
-    if (!readRequest(connection, request))
-        return;
+    char c = 0;
+    while (!request.ends_with("\r\n\r\n"))
+    {
+        if (connection.readRaw(&c, 1) != 1)
+            return;
+        request += c;
+    }
     size_t index = 0;
     {
         std::lock_guard<std::mutex> guard(mutex);
@@ -105,46 +84,20 @@ void Peer::answer(int connection)
         received.push_back(request);
     }
     const Answer given = script(request, index);
-    for (size_t sent = 0; sent < given.bytes.size();)
-    {
-        const ssize_t count =
-            send(connection, given.bytes.data() + sent, given.bytes.size() - sent, MSG_NOSIGNAL);
-        if (count <= 0)
-            return;
-        sent += static_cast<size_t>(count);
-    }
-    char rest = 0;
-    // Only the other side's end or that of this peer ends it.
-    while (given.isHeld && awaitInput(connection) && recv(connection, &rest, 1, 0) > 0)
+    connection.writeRaw(given.bytes.data(), static_cast<int64>(given.bytes.size()));
+    while (given.isHeld && connection.readRaw(&c, 1) == 1)
         continue;
-}
-
-bool Peer::readRequest(int connection, std::string& request) const
-{
-    char c = 0;
-    while (!request.ends_with("\r\n\r\n"))
-    {
-        if (!awaitInput(connection) || recv(connection, &c, 1, 0) != 1)
-            return false;
-        request += c;
-    }
-    return true;
 }
 
 int freePort()
 {
-    const int handle = makeSocket();
-    const int port = bindAnywhere(handle);
-    close(handle);
-    return port;
+    NServer server(0, 1);
+    EXPECT_TRUE(server.setAddress(kLoopback) && server.open());
+    return server.getLocalPort();
 }
 
 bool isServed(int port)
 {
-    const int handle = makeSocket();
-    const sockaddr_in address = loopback(port);
-    const bool isConnected =
-        connect(handle, reinterpret_cast<const sockaddr*>(&address), sizeof address) == 0;
-    close(handle);
-    return isConnected;
+    const auto stream = adopt(new NStream);
+    return stream->open(kLoopback, static_cast<uint16>(port), 0);
 }

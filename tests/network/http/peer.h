@@ -1,5 +1,9 @@
 #pragma once
 
+#include "foundation/object/iptr.h"
+#include "network/socket/nserver.h"
+#include "network/socket/nstream.h"
+
 #include <functional>
 #include <mutex>
 #include <string>
@@ -15,7 +19,7 @@ public:
     struct Answer
     {
         std::string bytes;
-        /// Whether the connection stays open until the peer goes.
+        /// Whether the connection stays open until the other side or the peer goes.
         bool isHeld = false;
     };
     /// Called by the server's thread with the request and how many came before it.
@@ -28,7 +32,7 @@ public:
     Peer(const Peer&) = delete;
     Peer& operator=(const Peer&) = delete;
 
-    int port() const { return number; }
+    int port() const { return server.getLocalPort(); }
     /// "http://127.0.0.1:<port>" and the rest.
     std::string url(const std::string& rest = "/") const;
     /// All requests that were read whole.
@@ -37,17 +41,14 @@ public:
 
 private:
     void serve();
-    void answer(int connection);
-    bool readRequest(int connection, std::string& request) const;
-    bool awaitInput(int handle) const;
+    void answer(NStream& connection);
 
     Script script;
-    int listener = -1;
-    // Readable once the peer is to end.
-    int endPipe[2] = {-1, -1};
-    int number = 0;
+    NServer server{0, 16};
     mutable std::mutex mutex;
     std::vector<std::string> received;
+    IPtr<NStream> current;
+    bool isEnding = false;
     std::thread thread;
 };
 

@@ -5,12 +5,15 @@
 #include "foundation/object/iptr.h"
 #include "foundation/text/utranslatedstring.h"
 #include "foundation/thread/flockscope.h"
+#include "foundation/thread/fthread.h"
 #include "network/http/furlstream.h"
 #include "network/http/httpproxy.h"
 #include "network/http/httprequest.h"
 #include "storage/path/filenametext.h"
 #include "storage/url/furl.h"
 #include "views/dialog/ucommondialog.h"
+
+#include <atomic>
 
 namespace
 {
@@ -20,6 +23,9 @@ constexpr const char* kQuestion = "Question";
 constexpr int kConnectLimit = 6;
 // In milliseconds. Servers may think for long before they answer.
 constexpr int kStallLimit = 60000;
+
+// The one that registers the handlers.
+std::atomic<FThreadID> mainThread = 0;
 
 UTranslatedString stringAuthenticate("Authentication Required");
 } // namespace
@@ -257,10 +263,6 @@ void FUrlHttpHandler::forgetUser()
 
 bool FUrlHttpHandler::ask()
 {
-    FMessenger* messenger = gMessenger;
-    if (!messenger)
-        return false;
-
     auto message = adopt(new FMessage(kAuthenticateMessage));
     {
         FLockScope guard(lock);
@@ -270,10 +272,15 @@ bool FUrlHttpHandler::ask()
         dialogResult = false;
         message->addData(kQuestion, ++question);
     }
-    // Whoever cancels may let go of the handler before the message arrives.
-    message->add("Handler", this, true);
-    messenger->postMessage(this, message.take());
-    answered.wait();
+    if (FThread::currentThreadID() == mainThread)
+        notify(message);
+    else if (FMessenger* messenger = gMessenger)
+    {
+        // Whoever cancels may let go of the handler before the message arrives.
+        message->add("Handler", this, true);
+        messenger->postMessage(this, message.take());
+        answered.wait();
+    }
 
     FLockScope guard(lock);
     question++;
@@ -317,5 +324,6 @@ FUrlHandler* createUrlHttpHandler(FUrl& url)
 
 void initFUrlHttpHandler()
 {
+    mainThread = FThread::currentThreadID();
     FUrl::registerHandler(FString("http"), FUrlHttpHandler::kPort, createUrlHttpHandler);
 }

@@ -16,8 +16,8 @@ struct HttpProxy;
 /// proxy of the user's settings; and asks the user for name and password where a server wants them for the scheme
 /// "Basic". What the user typed for one server never goes to another. HttpReplyHead tells what is read of a reply.
 ///
-/// For a worker thread: a question waits for the main thread, which shows it at its next pulse. Any thread may
-/// `cancel`; everything else is for one thread at a time.
+/// For a worker thread: a question waits for the main thread, which shows it at its next pulse. (On the main thread
+/// it is shown at once.) Any thread may `cancel`; everything else is for one thread at a time.
 class FUrlHttpHandler : public FUrlHandler
 {
     DECLARE_TYPE(FUrlHttpHandler, FUrlHandler)
@@ -100,5 +100,5 @@ private:
 };
 
 FUrlHandler* createUrlHttpHandler(FUrl& url);
-/// Registers the handler; once at start.
+/// Registers the handler; once at start, on the main thread.
 void initFUrlHttpHandler();
