@@ -49,10 +49,7 @@ bool isMadeByIdentifier(const MetaClass& meta)
     void* view = nullptr;
     if (!object || object->queryInterface(iid, &view) != kResultOk)
         return false;
-    // One reference of the maker and one of the query.
-    const bool isFresh = object->release() == 1;
-    object->addRef();
-    return isFresh && view == object.get();
+    return view == object.get() && object->release() == 1;
 }
 
 void expectDeclaredAs(CmObject& object, const MetaClass& meta)
