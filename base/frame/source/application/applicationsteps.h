@@ -4,7 +4,7 @@
 
 /// The steps in the life of the process that belong to screens and network, at their places in the order.
 ///
-/// Each does nothing until its classes exist; what stands above the application fills them in. *Main thread*.
+/// Those of screens do nothing until their classes exist; what stands above the application fills them in. *Main thread*.
 class ApplicationSteps
 {
 public:
@@ -28,7 +28,8 @@ public:
 
     // End
     virtual void clearClipboard() {}
-    virtual void stopNetMessenger() {}
+    /// Stops `gNetMessenger`, if there is one.
+    virtual void stopNetMessenger();
     virtual void deleteWindowManager() {}
     virtual void deleteSkinManager() {}
     virtual void deleteUIWizard() {}

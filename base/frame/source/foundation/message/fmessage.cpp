@@ -191,3 +191,18 @@ int32 FMessage::getTString(const char* id, String& result)
     result.assign(ConstString());
     return -1;
 }
+
+bool FMessage::externalize(FArchive& archive) const
+{
+    return FString(type).externalize(archive) && attributes.externalize(archive);
+}
+
+bool FMessage::internalize(FArchive& archive)
+{
+    const auto read = adopt(new CmString);
+    if (!read->internalize(archive))
+        return false;
+    readType = read;
+    type = ConstString(readType->text8());
+    return attributes.internalize(archive);
+}

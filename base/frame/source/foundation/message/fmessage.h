@@ -3,14 +3,16 @@
 #include "containers/sequence/cmarray.h"
 #include "foundation/message/imessage.h"
 #include "foundation/object/cmobject.h"
-#include "foundation/text/string.h"
+#include "foundation/object/iptr.h"
+#include "foundation/text/cmstring.h"
 #include "storage/attribute/fattributelist.h"
 #include "storage/attribute/fstringidattribute.h"
 
 /// A typed message with values by name: the one carrier of news between threads.
 ///
-/// The type is a text that outlives the message, as a literal does; only a view of it is kept. Texts and objects
-/// are held by the message. One thread at a time; posting hands a message over.
+/// The type is a text that outlives the message, as a literal does; only a view of it is kept, but for a type that
+/// was read from an archive. Texts and objects are held by the message. One thread at a time; posting hands a message
+/// over.
 class FMessage : public CmObject, public IMessage2
 {
     DECLARE_CLASS(FMessage, CmObject)
@@ -55,10 +57,17 @@ class FMessage : public CmObject, public IMessage2
     void addTString(const char* id, const ConstString& text) override;
     int32 getTString(const char* id, String& result) override;
 
+    /// The type as a text, then the values in their order. False where a value is one that makes no sense elsewhere, as
+    /// a bare pointer.
+    bool externalize(FArchive& archive) const override;
+    bool internalize(FArchive& archive) override;
+
 private:
     FAttributeValue* textValue(const char* id) const;
     FAttributeValue* numberValue(const char* id) const;
 
     ConstString type;
+    // A type that was read; copies share it.
+    IPtr<CmString> readType;
     FAttributeList<FStringIDAttribute, const char*, CmArray> attributes;
 };

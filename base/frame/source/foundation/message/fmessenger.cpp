@@ -225,6 +225,12 @@ int FMessenger::messagesPosted(CmObject* receiver, const char* messageType)
     return countPosted(postedQueue, identityOf(receiver), messageType);
 }
 
+int FMessenger::countWaiting()
+{
+    FLockScope guard(postLock);
+    return postedQueue.total();
+}
+
 bool FMessenger::wasMessagePosted(IMessageReceiver* receiver)
 {
     return areMessagesPosted(receiver, nullptr);

@@ -65,6 +65,9 @@ class FMessenger : public CmObject, public IMessenger
     /// How many of them.
     int messagesPosted(CmObject* receiver, const char* messageType);
 
+    /// How many messages wait for whomever.
+    int countWaiting();
+
     /// A name that is taken already goes to the new receiver.
     void registerName(const char* name, CmObject* receiver);
     void unregisterName(const char* name);

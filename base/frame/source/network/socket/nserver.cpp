@@ -29,7 +29,12 @@ NStream* NServer::waitForConnection()
     if (!isOpen())
         return nullptr;
     auto connection = socket.accept(nullptr, nullptr, false);
-    return connection ? new NStream(std::move(connection)) : nullptr;
+    return connection ? makeStream(std::move(connection)) : nullptr;
+}
+
+NStream* NServer::makeStream(std::unique_ptr<NSocket> connection)
+{
+    return new NStream(std::move(connection));
 }
 
 void NServer::stop()

@@ -42,6 +42,10 @@ class NServer : public CmObject
     void getIPAddress(String& address) const;
     const NSocket& getSocket() const { return socket; }
 
+protected:
+    /// What a connection is handed out as.
+    virtual NStream* makeStream(std::unique_ptr<NSocket> connection);
+
 private:
     NSocket socket{NSocket::kStream};
     uint16 port;

@@ -53,6 +53,14 @@ void NSocket::stopOperation()
     PlatformSocket::wake(wakeHandle);
 }
 
+bool NSocket::waitForStop(int timeout) const
+{
+    NSocketPoll poll;
+    poll.addCanceller(*this);
+    poll.wait(timeout);
+    return stopped;
+}
+
 // Addresses
 
 bool NSocket::bind(uint16 port)

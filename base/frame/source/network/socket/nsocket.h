@@ -62,6 +62,8 @@ public:
     /// Ends whatever operation waits, and every later one, until `endSocket`. Any thread.
     void stopOperation();
     bool isStopped() const { return stopped; }
+    /// Waits at most `timeout` milliseconds, -1 without limit, for a stop; whether there was one.
+    bool waitForStop(int timeout) const;
 
     // Addresses
 

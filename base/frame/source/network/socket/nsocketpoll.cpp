@@ -3,8 +3,13 @@
 int NSocketPoll::add(const NSocket& socket, PendingQuery query)
 {
     sockets.push_back({socket.handle, query, false});
-    wakeHandles.push_back(socket.wakeHandle);
+    addCanceller(socket);
     return static_cast<int>(sockets.size()) - 1;
+}
+
+void NSocketPoll::addCanceller(const NSocket& socket)
+{
+    wakeHandles.push_back(socket.wakeHandle);
 }
 
 bool NSocketPoll::wait(int timeout)

@@ -11,6 +11,8 @@ class NSocketPoll
 public:
     /// Gives the number by which the socket is asked for after the wait.
     int add(const NSocket& socket, PendingQuery query);
+    /// A stop of this socket ends the wait, too.
+    void addCanceller(const NSocket& socket);
     /// Waits at most `timeout` milliseconds, -1 without limit, until one of the sockets is ready. False when the time
     /// is over or one of them was stopped.
     bool wait(int timeout);

@@ -99,7 +99,7 @@ CmObject* FSimpleArchive::findRead(uint32 number, const char* className)
 CmObject* FSimpleArchive::readBody(MetaClass* meta, const char* className, bool shared)
 {
     IPtr<CmObject> object = createStoredObject(meta, className);
-    if (!object)
+    if (!object || objects.size() >= objectLimit)
         return refuse();
     objects.push_back(object);
     const size_t index = entries.size();

@@ -3,6 +3,7 @@
 #include "foundation/object/cmobject.h"
 #include "storage/attribute/farchive.h"
 
+#include <cstdint>
 #include <string>
 #include <unordered_map>
 #include <vector>
@@ -32,6 +33,8 @@ public:
     MetaClass* readClass(int32 tag);
     bool writeClass(MetaClass* meta);
 
+    /// While reading, a further object is an error. Without a limit at first.
+    void setObjectLimit(int limit) { objectLimit = static_cast<size_t>(limit); }
     /// All objects that were read, or whose reading failed, in the order in which they began.
     const std::vector<IPtr<CmObject>>& getObjects() const { return objects; }
 
@@ -62,4 +65,5 @@ private:
     std::vector<Entry> entries;
     std::vector<IPtr<CmObject>> objects;
     std::vector<StoredClass> classes;
+    size_t objectLimit = SIZE_MAX;
 };

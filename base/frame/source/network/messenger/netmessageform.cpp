@@ -1,0 +1,50 @@
+#include "network/messenger/netmessageform.h"
+
+#include "containers/sequence/cmcontainer.h"
+#include "storage/attribute/fsimplearchive.h"
+#include "storage/stream/fmemorystream.h"
+
+namespace
+{
+/// Gives the lists that came the references of their elements, which the archive left to nobody.
+void ownElements(const FSimpleArchive& archive)
+{
+    for (const auto& object : archive.getObjects())
+        if (auto* container = FCast(CmContainer, object.get()))
+            if (container->getOwnership() == CmContainer::kShared)
+                container->takeElements();
+}
+
+bool readParts(FSimpleArchive& archive, FString& receiver, NMessage& message)
+{
+    int32 zero = 0;
+    return receiver.internalize(archive) && archive.getStream().readInt32(zero) && zero == 0 &&
+           message.internalize(archive);
+}
+} // namespace
+
+bool writeNetMessage(FStream& stream, const char* receiver, const FMessage& message)
+{
+    FSimpleArchive archive(&stream, true);
+    return FString(receiver).externalize(archive) && stream.writeInt32(0) && message.externalize(archive);
+}
+
+IPtr<NMessage> readNetMessage(FStream& stream, FString& receiver)
+{
+    auto message = adopt(new NMessage);
+    FSimpleArchive archive(&stream, false);
+    archive.setObjectLimit(kMaxNetMessageObjects);
+    const bool isRead = readParts(archive, receiver, *message);
+    ownElements(archive);
+    return isRead ? message : nullptr;
+}
+
+IPtr<NMessage> copyForNetwork(const FMessage& message)
+{
+    FMemoryStream stream;
+    if (!writeNetMessage(stream, "", message) || stream.getSize() > kMaxNetMessage)
+        return nullptr;
+    stream.rewind();
+    FString receiver;
+    return readNetMessage(stream, receiver);
+}

@@ -1,0 +1,24 @@
+#pragma once
+
+#include "foundation/object/iptr.h"
+#include "network/messenger/nmessage.h"
+
+class FStream;
+class FString;
+
+// The form of a message on its way: the name of its receiver, a 32-bit 0, the message.
+
+/// The most bytes that a message may have.
+inline constexpr int64 kMaxNetMessage = 16 * 1024 * 1024;
+/// The most objects that it may have.
+inline constexpr int kMaxNetMessageObjects = 65536;
+
+/// False where a value of the message can't be sent.
+bool writeNetMessage(FStream& stream, const char* receiver, const FMessage& message);
+
+/// Null where the bytes are no message. Lists that share their elements come out as lists that own them, for nobody
+/// else would.
+IPtr<NMessage> readNetMessage(FStream& stream, FString& receiver);
+
+/// A copy that shares nothing with the original; null where a value can't be sent.
+IPtr<NMessage> copyForNetwork(const FMessage& message);
