@@ -1,5 +1,6 @@
 #pragma once
 
+#include "foundation/object/blockpool.h"
 #include "foundation/object/classmacros.h"
 #include "foundation/object/idependent.h"
 
@@ -7,6 +8,7 @@ class IUpdateHandler;
 
 /// Base of everything that is counted: one word of data, the type test, and changes that others depend on.
 ///
+/// Objects come from the pool of small blocks, since trees and messages make and drop them by the thousands.
 /// A new object has the count 1, which belongs to its maker. An object on the stack or a member by value keeps
 /// that count and is never released. `addRef` and `release` are thread-safe; all else belongs to one thread at a
 /// time.
@@ -15,6 +17,8 @@ class FObject : public IDependent
     friend FClassTag<FObject> fNearestDeclaredClass(const FObject*, FDeclaredAs<FObject>);
 
 public:
+    FPOOLED_OBJECTS
+
     FObject() = default;
     /// A copy is an object of its own: it starts at the count 1.
     FObject(const FObject&) : IDependent() {}
