@@ -151,3 +151,13 @@ bool FFilePresetList::restoreAttributes(FAttributes&)
 {
     return false;
 }
+
+bool FFilePresetList::internalize(FArchive&)
+{
+    return false;
+}
+
+bool FFilePresetList::externalize(FArchive&) const
+{
+    return false;
+}

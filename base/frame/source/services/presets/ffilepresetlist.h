@@ -38,9 +38,11 @@ class FFilePresetList : public FPresetList
     /// Makes a folder.
     FPresetList* addSubList(const char16* listName) override;
 
-    /// Always false: the folder is what is stored.
+    // Always false: the folder is what is stored.
     bool storeAttributes(FAttributes& attributes) const override;
     bool restoreAttributes(FAttributes& attributes) override;
+    bool internalize(FArchive& archive) override;
+    bool externalize(FArchive& archive) const override;
 
 protected:
     void prepare() override;

@@ -49,7 +49,7 @@ FPresetList::FPresetList(const FPresetList& other) : FPresetItem(other), name(ot
 
 FPresetList::~FPresetList()
 {
-    FPresetList::removeAll();
+    removeAll();
 }
 
 // Items

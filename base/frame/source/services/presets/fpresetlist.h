@@ -53,7 +53,6 @@ class FPresetList : public FPresetItem
     FPreset* getPreset(int index);
     /// The first preset of that name; -1 where there is none.
     int findPreset(const char16* presetName);
-    void removeAll();
 
     bool storeAttributes(FAttributes& attributes) const override;
     /// False where there is no ID.
@@ -67,6 +66,7 @@ protected:
     /// False, with the item given back, where it belongs to a list already or this list stands below it.
     bool addItem(const IPtr<FPresetItem>& item);
     bool removeItem(FPresetItem* item);
+    void removeAll();
     const std::vector<FPreset*>& getPresets() const { return presets; }
     const std::vector<FPresetList*>& getSubLists() const { return subLists; }
 

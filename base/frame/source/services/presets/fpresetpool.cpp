@@ -51,12 +51,12 @@ void FPresetPool::removeAll()
     lists.removeAll();
 }
 
-bool FPresetPool::hasMemoryLists() const
+int FPresetPool::countMemoryLists() const
 {
+    int count = 0;
     for (int i = 0; i < lists.total(); i++)
-        if (isInMemory(*getListAt(i)))
-            return true;
-    return false;
+        count += isInMemory(*getListAt(i)) ? 1 : 0;
+    return count;
 }
 
 // Storage
@@ -84,10 +84,10 @@ bool FPresetPool::restoreAttributes(FAttributes& attributes)
 
 bool FPresetPool::externalize(FArchive& archive) const
 {
-    if (!archive.writeCount(lists.total()))
+    if (!archive.writeCount(countMemoryLists()))
         return false;
     for (int i = 0; i < lists.total(); i++)
-        if (!archive.writeObject(getListAt(i), true))
+        if (isInMemory(*getListAt(i)) && !archive.writeObject(getListAt(i), true))
             return false;
     return true;
 }

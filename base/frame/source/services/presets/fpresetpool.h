@@ -49,7 +49,7 @@ class FPresetPool : public CmObject
     bool externalize(FArchive& archive) const override;
 
 private:
-    bool hasMemoryLists() const;
+    int countMemoryLists() const;
     bool loadMemoryLists(const FNPath& folder);
     void loadOwnFile(const FNPath& path);
     bool saveMemoryLists(const FNPath& folder);

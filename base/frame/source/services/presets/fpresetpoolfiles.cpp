@@ -152,7 +152,7 @@ bool FPresetPool::saveMemoryLists(const FNPath& folder)
 {
     FNPath path(kMemoryFileName, &folder, FPath::kFile);
     // An empty file says that there are none any more.
-    if (!hasMemoryLists() && !gFileSystem->fileExists(&path))
+    if (countMemoryLists() == 0 && !gFileSystem->fileExists(&path))
         return true;
     if (!makeRoom(path, memoryFile))
         return false;
