@@ -187,8 +187,29 @@ TEST(FPresetList, FormsATreeWhateverAFileSays)
         EXPECT_TRUE(list.restoreAttributes(tree));
     }
     EXPECT_EQ(presetsOf(list), "l1(l2(self=?)) l5(l4())");
+    EXPECT_EQ(list.getSubList(0)->getRefCount(), 1u) << "what was refused holds nothing";
     auto copy = adopt(static_cast<FPresetList*>(list.newCopy()));
     EXPECT_EQ(presetsOf(*copy), presetsOf(list));
+}
+
+TEST(FPreset, RefusesAnObjectThatLeadsBackToIt)
+{
+    const std::string text =
+        "<?xml version=\"1.0\"?><Test><obj name=\"Preset\" ID=\"1\"/>"
+        "<obj class=\"FPreset\" ID=\"1\"><obj name=\"Object\" ID=\"2\"/></obj>"
+        "<obj class=\"FMultiPreset\" ID=\"2\"><list name=\"Objects\" type=\"obj\">"
+        "<item value=\"3\"/><item value=\"1\"/></list></obj>"
+        "<obj class=\"StoredNode\" ID=\"3\"><int name=\"Number\" value=\"3\"/></obj></Test>";
+    const int before = StoredNode::alive;
+    {
+        FAttributes tree;
+        ASSERT_TRUE(FXmlArchive(streamOf(text), false).loadAttributes("Test", tree));
+        const auto* preset = FCast(FPreset, tree.getObject("Preset", "FPreset"));
+        ASSERT_TRUE(preset);
+        EXPECT_EQ(preset->getObject(), nullptr);
+        EXPECT_EQ(StoredNode::alive, before + 1);
+    }
+    EXPECT_EQ(StoredNode::alive, before) << "a ring would never be released";
 }
 
 TEST(FPreset, KeepsObjectsOfClassesThatItDoesNotKnow)

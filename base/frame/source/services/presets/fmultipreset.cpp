@@ -5,6 +5,7 @@
 #include "storage/attribute/farchive.h"
 #include "storage/attribute/fattributes.h"
 #include "storage/attribute/fobjectlist.h"
+#include "storage/attribute/ringguard.h"
 #include "storage/stream/fstream.h"
 
 DEFINE_CLASS(FMultiPreset, CmObject)
@@ -122,7 +123,12 @@ bool FMultiPreset::restoreAttributes(FAttributes& attributes)
                              ? FCast(FObjectList, attributes.entry(kObjects).getObj())
                              : nullptr;
     for (int i = 0; stored && i < stored->total(); i++)
-        keep(keepStoredObject(stored->at(i)));
+    {
+        const RingGuard guard(*this);
+        const IPtr<CmObject> object = keepStoredObject(stored->at(i));
+        if (!guard.isRing())
+            keep(object);
+    }
     return true;
 }
 
@@ -142,7 +148,13 @@ bool FMultiPreset::internalize(FArchive& archive)
     int count = 0;
     if (!archive.getStream().readBool(isCopy) || !archive.readCount(count))
         return false;
-    for (int i = 0; i < count && archive.getLastError() != FArchive::kBadStream; i++)
-        keep(adopt(archive.readObject(nullptr, true)));
+    for (int i = 0; i < count; i++)
+    {
+        const RingGuard guard(*this);
+        const auto object = adopt(archive.readObject(nullptr, true));
+        if (!object || guard.isRing())
+            return false;
+        keep(object);
+    }
     return true;
 }

@@ -4,6 +4,7 @@
 #include "storage/attribute/farchive.h"
 #include "storage/attribute/fattributes.h"
 #include "storage/attribute/optionaltext.h"
+#include "storage/attribute/ringguard.h"
 #include "storage/stream/fstream.h"
 
 DEFINE_CLASS(FPreset, FPresetItem)
@@ -60,11 +61,12 @@ bool FPreset::restoreAttributes(FAttributes& attributes)
 {
     OptionalText::restore(attributes, kName, name);
     object = nullptr;
+    const RingGuard guard(*this);
+    IPtr<CmObject> stored;
     if (attributes.containsAttribute(kObject))
-        object = keepStoredObject(attributes.entry(kObject).getObj());
-    // Damaged bytes can name the preset itself, which would then keep itself for ever.
-    if (object == this)
-        object = nullptr;
+        stored = keepStoredObject(attributes.entry(kObject).getObj());
+    if (!guard.isRing())
+        object = stored;
     setFlag(kMayBeModified, !isSet(attributes, kNoModify));
     setFlag(kRenamed, !isSet(attributes, kUnrenamed));
     return true;
@@ -80,10 +82,12 @@ bool FPreset::internalize(FArchive& archive)
 {
     if (!name.internalize(archive))
         return false;
+    object = nullptr;
+    const RingGuard guard(*this);
     // An object of an unknown class is passed over.
-    object = adopt(archive.readObject(nullptr, true));
-    if (object == this)
-        object = nullptr;
+    const auto stored = adopt(archive.readObject(nullptr, true));
+    if (!guard.isRing())
+        object = stored;
     int32 storedFlags = 0;
     const bool isRead = archive.getStream().readInt32(storedFlags);
     flags = static_cast<uint32>(storedFlags) & (kMayBeModified | kRenamed);

@@ -2,6 +2,7 @@
 
 #include "storage/attribute/farchive.h"
 #include "storage/attribute/fattributes.h"
+#include "storage/attribute/ringguard.h"
 
 #include <algorithm>
 
@@ -243,11 +244,22 @@ bool FPresetList::restoreAttributes(FAttributes& attributes)
     if (!attributes.get(kName, name))
         name = id;
     attributes.resetQueue(kItems);
-    while (CmObject* stored = attributes.unqueueObject(kItems, "FPresetItem"))
-        addItem(adopt(static_cast<FPresetItem*>(stored)));
+    while (addNextItem(attributes))
+    {
+    }
     if (items.isEmpty())
         restoreOlderForm(attributes);
     return true;
+}
+
+/// False at the end of the items.
+bool FPresetList::addNextItem(FAttributes& attributes)
+{
+    const RingGuard guard(*this);
+    const auto stored = adopt(attributes.unqueueObject(kItems, "FPresetItem"));
+    if (stored && !guard.isRing())
+        addItem(IPtr<FPresetItem>(static_cast<FPresetItem*>(stored.get())));
+    return stored != nullptr;
 }
 
 void FPresetList::restoreOlderForm(FAttributes& attributes)
@@ -286,8 +298,9 @@ bool FPresetList::internalize(FArchive& archive)
         return false;
     for (int i = 0; i < count; i++)
     {
-        auto item = adopt(archive.readObject("FPresetItem", true));
-        if (!item)
+        const RingGuard guard(*this);
+        const auto item = adopt(archive.readObject("FPresetItem", true));
+        if (!item || guard.isRing())
             return false;
         addItem(IPtr<FPresetItem>(static_cast<FPresetItem*>(item.get())));
     }

@@ -76,6 +76,7 @@ protected:
 
 private:
     bool isWithin(const FPresetItem* item) const;
+    bool addNextItem(FAttributes& attributes);
     void restoreOlderForm(FAttributes& attributes);
 
     // The items by kind, so that an index needs no search.
