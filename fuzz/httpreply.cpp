@@ -15,22 +15,23 @@ constexpr char kNextReply = '\x1E';
 class Replies
 {
 public:
-    explicit Replies(std::string bytes) : rest(std::move(bytes)) {}
+    explicit Replies(std::string allBytes) : bytes(std::move(allBytes)) {}
 
     /// False where there is none left: nobody answers.
     bool takeNext(std::string& reply)
     {
         if (isOver)
             return false;
-        const size_t end = rest.find(kNextReply);
+        const size_t end = bytes.find(kNextReply, next);
         isOver = end == std::string::npos;
-        reply = rest.substr(0, end);
-        rest.erase(0, isOver ? rest.size() : end + 1);
+        reply = bytes.substr(next, isOver ? end : end - next);
+        next = end + 1;
         return true;
     }
 
 private:
-    std::string rest;
+    std::string bytes;
+    size_t next = 0;
     bool isOver = false;
 };
 
@@ -46,8 +47,8 @@ class ReplayStream : public FUrlStream
 protected:
     int receiveSome(char* data, int size) override
     {
-        const size_t count = reply.copy(data, static_cast<size_t>(size));
-        reply.erase(0, count);
+        const size_t count = reply.copy(data, static_cast<size_t>(size), received);
+        received += count;
         return static_cast<int>(count);
     }
     int sendSome(const char*, int size) override { return size; }
@@ -55,6 +56,7 @@ protected:
 private:
     Replies& replies;
     std::string reply;
+    size_t received = 0;
 };
 
 class ReplayHandler : public FUrlHttpHandler
@@ -67,6 +69,11 @@ class ReplayHandler : public FUrlHttpHandler
 
 protected:
     FUrlStream* newStream() override { return new ReplayStream(replies); }
+    bool askUser(FString& name, FString& secret) override
+    {
+        name = secret = u"ada";
+        return true;
+    }
 
 private:
     Replies& replies;
