@@ -66,8 +66,7 @@ void makeServices()
         gFileSystem = new FNFileSystem;
     if (!gTranslator)
         new UTranslator;
-    if (!gComponentRegistry)
-        gComponentRegistry = new FComponentRegistry;
+    FComponentRegistry::bringUp();
 }
 } // namespace
 

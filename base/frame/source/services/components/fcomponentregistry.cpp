@@ -1,12 +1,21 @@
 #include "services/components/fcomponentregistry.h"
 
 #include "foundation/object/iptr.h"
+#include "services/components/fcomponententry.h"
 
 FComponentRegistry* gComponentRegistry = nullptr;
 
 FComponentRegistry::FComponentRegistry()
 {
     components.retainElements();
+}
+
+void FComponentRegistry::bringUp()
+{
+    if (gComponentRegistry)
+        return;
+    gComponentRegistry = new FComponentRegistry;
+    FComponentEntry::registerAll(*gComponentRegistry);
 }
 
 bool FComponentRegistry::registerComponent(FComponentDescription* description)

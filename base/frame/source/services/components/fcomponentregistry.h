@@ -15,6 +15,9 @@ class FComponentRegistry : public CmObject
     FComponentRegistry(const FComponentRegistry&) = delete;
     FComponentRegistry& operator=(const FComponentRegistry&) = delete;
 
+    /// Makes the registry of the process, with the components that the program brings along, unless it is there.
+    static void bringUp();
+
     /// Takes over the caller's reference, also when it refuses: null, or an identifier that is invalid or taken.
     bool registerComponent(FComponentDescription* description);
     /// Forgets a component, as before its module goes. False where it isn't registered.
@@ -47,5 +50,5 @@ private:
     CmArray components{0, 10};
 };
 
-/// Set by the application at its start, and null before and after.
+/// Made at the start of a program, and null before and after.
 extern FComponentRegistry* gComponentRegistry;

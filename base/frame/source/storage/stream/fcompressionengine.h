@@ -34,8 +34,8 @@ class FDecompressor : public FObject
 
 /// A way of compressing. Engines are components of the category "Compression Engine".
 ///
-/// The data format is the engine's own, told apart by an identifier. One thread at a time; what it makes may be
-/// used by another.
+/// The data format is the engine's own, told apart by an identifier. *Thread-safe*: an archive that several threads
+/// read makes its decompressors from one engine. What it makes belongs to one thread at a time.
 class FCompressionEngine : public CmObject
 {
     DECLARE_ABSTRACT_CLASS(FCompressionEngine, CmObject)
@@ -48,6 +48,9 @@ class FCompressionEngine : public CmObject
     virtual FDecompressor* newDecompressor() = 0;
     virtual void getFormat(FUID& format) = 0;
     virtual int getType() = 0;
+    /// How many bytes so many compressed ones can hold at most; a file that claims more is damaged. Without a limit
+    /// of the format, the largest number.
+    virtual int64 getMaxUncompressedSize(int64 compressedSize);
 
     bool isFormat(const FUID& format);
 };
