@@ -170,6 +170,11 @@ bool FFileSystem::replaceInvalid(FString& name, char16 replacement, bool trim)
     return !(name == former);
 }
 
+bool FFileSystem::isBitwiseCopyable(FPath*)
+{
+    return true;
+}
+
 FFileIterator* FFileSystem::newIterator(const FPath*, bool)
 {
     return nullptr;

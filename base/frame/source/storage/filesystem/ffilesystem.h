@@ -49,11 +49,11 @@ class FFileSystem : public CmObject
     /// Adds up the files, and with `withFolders` the folders too, and their bytes in `bytes`, which may be
     /// null.
     virtual int64 countFiles(const FPath* path, bool recursive, bool withFolders, int64* bytes);
+    /// Whether the file's bytes are kept as they are; false for one that is compressed.
+    virtual bool isBitwiseCopyable(FPath* path);
 
     /// What `makeValidName` does for names that the disk takes.
     static bool replaceInvalid(FString& name, char16 replacement, bool trim);
-
-protected:
     /// Copies all bytes, telling `hook` of them. The streams stay open.
     static bool copyContent(FStream& from, FStream& to, UProgressHook* hook);
 };

@@ -100,11 +100,12 @@ class FNFileSystem : public FFileSystem
     /// The figure has three places: "1.465 KB". A figure in bytes is divided by 1000, so that 1500 bytes are
     /// "1.500 Bytes". False for an empty or missing file.
     bool getFileSizeString(FPath* path, FString& result, int unit);
+    /// The same for a number of bytes.
+    static void makeFileSizeString(double bytes, FString& result, int unit);
     bool canWrite(FPath* path);
     bool enableWrite(FPath* path, bool state);
     bool isHidden(FPath* path);
-    /// Whether a file's bytes can be copied as they are.
-    bool isBitwiseCopyable(FPath*) { return true; }
+    bool isBitwiseCopyable(FPath*) override { return true; }
     /// Files have no type besides their name and content here: always false.
     bool changeFileType(FPath* path, const FFileType& fileType);
     /// Whether name or content say that the file is of this type.

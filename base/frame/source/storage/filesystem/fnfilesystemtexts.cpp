@@ -205,7 +205,13 @@ bool FNFileSystem::getFileSizeString(FPath* path, FString& result, int unit)
     const int64 size = getFileSize(path);
     if (size <= 0)
         return false;
-    double figure = static_cast<double>(size);
+    makeFileSizeString(static_cast<double>(size), result, unit);
+    return true;
+}
+
+void FNFileSystem::makeFileSizeString(double bytes, FString& result, int unit)
+{
+    double figure = bytes;
     int step = kBytes;
     while (step < kGigaBytes && (unit < 0 ? figure >= 1024 : step < unit))
     {
@@ -218,7 +224,6 @@ bool FNFileSystem::getFileSizeString(FPath* path, FString& result, int unit)
     figureText.printf("%.3f ", figure);
     result = figureText;
     result.append(stringUnits[step].text());
-    return true;
 }
 
 const char16* FNFileSystem::getDriveTypeString(int driveType)

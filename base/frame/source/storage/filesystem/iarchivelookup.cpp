@@ -1,8 +1,10 @@
 #include "storage/filesystem/iarchivelookup.h"
 
+#include <atomic>
+
 namespace
 {
-IArchiveLookup* theLookup = nullptr;
+std::atomic<IArchiveLookup*> theLookup{nullptr};
 }
 
 IArchiveLookup* IArchiveLookup::instance()
