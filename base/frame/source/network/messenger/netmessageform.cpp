@@ -11,7 +11,8 @@ void ownElements(const FSimpleArchive& archive)
 {
     for (const auto& object : archive.getObjects())
         if (auto* container = FCast(CmContainer, object.get()))
-            if (container->getOwnership() == CmContainer::kShared)
+            if (const int16 mode = container->getOwnership();
+                mode != CmContainer::kTaken && mode != CmContainer::kRetained)
                 container->takeElements();
 }
 

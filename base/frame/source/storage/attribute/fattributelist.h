@@ -7,7 +7,10 @@
 #include "storage/attribute/fintidattribute.h"
 #include "storage/attribute/fstringidattribute.h"
 
+#include <algorithm>
+#include <numeric>
 #include <type_traits>
+#include <vector>
 
 /// Values by key: a container that owns its entries, which are `Entry` objects.
 ///
@@ -57,6 +60,7 @@ private:
     static Key usableKey(Key key);
     int find(Key key) const;
     int findSorted(Key key) const;
+    void addRead(std::vector<IPtr<Entry>>& read);
 };
 
 using FStringAttributeList = FAttributeList<FStringIDAttribute, const char*, CmOrderedArray>;
@@ -159,12 +163,32 @@ bool FAttributeList<Entry, Key, Container>::internalize(FArchive& archive)
     int count = 0;
     if (!archive.readCount(count))
         return false;
-    for (int i = 0; i < count; i++)
+    std::vector<IPtr<Entry>> read;
+    bool isRead = true;
+    for (int i = 0; i < count && isRead; i++)
     {
-        auto read = adopt(new Entry);
-        if (!read->internalize(archive))
-            return false;
-        takeEntry(read.take());
+        auto entry = adopt(new Entry);
+        isRead = entry->internalize(archive);
+        if (isRead)
+            read.push_back(entry);
     }
-    return true;
+    addRead(read);
+    return isRead;
+}
+
+/// Of entries with one key the last one stays. Sorts instead of searching for each, since nothing vouches for their
+/// number and order.
+template <class Entry, class Key, class Container>
+void FAttributeList<Entry, Key, Container>::addRead(std::vector<IPtr<Entry>>& read)
+{
+    std::vector<size_t> byKey(read.size());
+    std::iota(byKey.begin(), byKey.end(), size_t{0});
+    std::stable_sort(byKey.begin(), byKey.end(),
+                     [&read](size_t a, size_t b) { return read[a]->compareKey(read[b]->getKey()) < 0; });
+    for (size_t i = 0; i + 1 < byKey.size(); i++)
+        if (read[byKey[i]]->compareKey(read[byKey[i + 1]]->getKey()) == 0)
+            read[byKey[i]] = nullptr;
+    for (size_t i = 0; i < read.size(); i++)
+        if (auto& entry = read[isOrdered ? byKey[i] : i])
+            Container::add(entry.take());
 }
