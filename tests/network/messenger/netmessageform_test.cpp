@@ -51,6 +51,7 @@ TEST(NetMessageForm, NamesTheReceiverThenAZeroThenTheMessage)
 
 TEST(NetMessageForm, CarriesEveryKindOfValue)
 {
+    const WordComponents components;
     const auto message = makeEveryKind("kinds");
     const auto read = readFrom(bytesOf(*message));
     ASSERT_TRUE(read);
@@ -78,6 +79,7 @@ TEST(NetMessageForm, CopiesShareNothing)
 
 TEST(NetMessageForm, DropsMessagesThatAreCutOrDamaged)
 {
+    const WordComponents components;
     const std::string bytes = bytesOf(*makeEveryKind("kinds"));
     for (size_t length = 0; length < bytes.size(); length++)
         EXPECT_FALSE(readFrom(bytes.substr(0, length))) << length;

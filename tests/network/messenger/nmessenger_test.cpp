@@ -62,6 +62,7 @@ protected:
 
 TEST_F(ExchangeTest, AMessageReachesTheObjectOfThatName)
 {
+    const WordComponents components;
     sending.setTimer(&timer);
     const auto message = makeEveryKind("kinds");
     sending.sendMessage("inbox", message);
@@ -78,6 +79,9 @@ TEST_F(ExchangeTest, AMessageReachesTheObjectOfThatName)
     EXPECT_TRUE(received->getReceivedTime(arrived));
     EXPECT_LT(sent, arrived);
     EXPECT_FALSE(message->contains(kNetSentStamp)) << "the sender's own message stays as it was";
+    // Its component must not outlive the registry.
+    inbox.received.clear();
+    receiving.stop();
 }
 
 TEST_F(ExchangeTest, FMessengerSendsNamedMessagesToTheNetwork)

@@ -86,6 +86,7 @@ int main()
     for (const int number : {SIGTERM, SIGUSR1})
         signal(number, onSignal);
     gMessenger = FMessenger::instance();
+    const WordComponents components;
     NMessenger messenger;
     Listener listener(messenger);
     NMessenger::setProgramInfo(
