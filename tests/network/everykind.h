@@ -12,7 +12,7 @@
 #include <limits>
 #include <string>
 
-inline constexpr FUID kWordComponentID{0x2C9A41E7, 0x5D034B8F, 0x91E6703A, 0xB8D25F14};
+inline const FUID kWordComponentID{0x2C9A41E7, 0x5D034B8F, 0x91E6703A, 0xB8D25F14};
 
 /// A component's object, which stores a word.
 class WordComponent : public FObject, public IPersistent
