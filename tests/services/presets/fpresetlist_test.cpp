@@ -1,7 +1,7 @@
 #include "foundation/message/updatehandler.h"
+#include "services/presets/fmultipreset.h"
 #include "services/presets/fpresetpointerlist.h"
 #include "services/presets/fpresetpool.h"
-#include "storage/attribute/fnewarchive.h"
 #include "tests/services/presets/presetsupport.h"
 
 namespace
@@ -17,12 +17,35 @@ IPtr<FPresetList> sampleList()
     return list;
 }
 
-/// A list with the ID "l1" and so on, as an archive has it.
-std::string storedList(int number, const std::string& items)
+// Pieces of an archive. The ID of list 1 is "l1".
+
+std::string object(const char* type, int id, const std::string& values)
 {
-    const std::string digits = std::to_string(number);
-    return "<obj class=\"FPresetList\" ID=\"" + digits + "\"><string name=\"ID\" value=\"l" + digits +
-           "\"/><list name=\"Items\" type=\"obj\">" + items + "</list></obj>";
+    return "<obj class=\"" + std::string(type) + "\" ID=\"" + std::to_string(id) + "\">" + values + "</obj>";
+}
+
+std::string objects(const char* name, std::initializer_list<int> ids)
+{
+    std::string items;
+    for (const int id : ids)
+        items += "<item value=\"" + std::to_string(id) + "\"/>";
+    return "<list name=\"" + std::string(name) + "\" type=\"obj\">" + items + "</list>";
+}
+
+std::string listOf(int number, std::initializer_list<int> items)
+{
+    return "<string name=\"ID\" value=\"l" + std::to_string(number) + "\"/>" + objects("Items", items);
+}
+
+std::string presetOf(int id)
+{
+    return "<string name=\"Name\" value=\"p\"/><obj name=\"Object\" ID=\"" + std::to_string(id) + "\"/>";
+}
+
+bool load(const std::string& content, FAttributes& tree)
+{
+    const std::string text = "<?xml version=\"1.0\"?><Test>" + content + "</Test>";
+    return FXmlArchive(streamOf(text), false).loadAttributes("Test", tree);
 }
 
 constexpr const char* kSample = "One=1 Two=2 Drums(Three=3 Loud(Four=4))";
@@ -95,28 +118,23 @@ TEST(FPresetList, CollectsObjectsIntoContainersOfAnyMode)
 TEST(FPresetList, ComesBackFromAnArchive)
 {
     const auto list = sampleList();
+    const auto stored = archived(*list);
+    FAttributes tree;
+    ASSERT_TRUE(list->storeAttributes(tree));
+    list->setPresetName(0, u"Uno");
+    list->removePresetAt(1);
     FPresetList restored(u"other");
-    restored.addPreset(node(9), u"replaced");
-    ASSERT_TRUE(restored.restoreAttributes(*archived(*list)));
-    EXPECT_EQ(presetsOf(restored), kSample);
+    for (FAttributes* each : {&tree, stored.get()})
+    {
+        restored.addPreset(node(9), u"replaced");
+        ASSERT_TRUE(restored.restoreAttributes(*each));
+        EXPECT_EQ(presetsOf(restored), kSample) << "a tree has copies of the items";
+    }
     EXPECT_EQ(utf8(restored.getID()), "sounds");
     EXPECT_EQ(utf8(restored.getName()), "Sounds");
     EXPECT_FALSE(restored.canModifiyPreset(1));
     EXPECT_TRUE(restored.presetRenamed(1));
     EXPECT_FALSE(restored.getSubList(0)->presetRenamed(0));
-}
-
-TEST(FPresetList, StoresCopiesOfItsItems)
-{
-    const auto list = sampleList();
-    FAttributes tree;
-    ASSERT_TRUE(list->storeAttributes(tree));
-    list->setPresetName(0, u"Uno");
-    list->removePresetAt(1);
-    FPresetList restored;
-    ASSERT_TRUE(restored.restoreAttributes(tree));
-    EXPECT_EQ(presetsOf(restored), kSample);
-    EXPECT_EQ(restored.getPresetObject(0), list->getPresetObject(0)) << "the objects are shared";
 }
 
 TEST(FPresetList, TakesTheIDForAMissingNameAndFailsWithoutAnID)
@@ -149,78 +167,66 @@ TEST(FPresetList, ReadsTheOlderForm)
     EXPECT_EQ(presetsOf(restored), "new=7") << "the older form counts only where there is no newer one";
 }
 
-TEST(FPresetList, ReadsTheBinaryForm)
-{
-    const auto list = sampleList();
-    auto stream = adopt(new FMemoryStream);
-    {
-        FNewArchive archive(stream, true);
-        ASSERT_TRUE(list->externalize(archive));
-    }
-    const std::string whole = contentOf(*stream);
-    for (size_t size = 0; size <= whole.size(); size++)
-    {
-        const auto cut = streamOf(whole.substr(0, size));
-        FNewArchive archive(cut, false);
-        FPresetList restored;
-        ASSERT_EQ(restored.internalize(archive), size == whole.size()) << "cut at " << size;
-        EXPECT_TRUE(size < whole.size() || presetsOf(restored) == kSample);
-    }
-}
-
 TEST(FPresetList, FormsATreeWhateverAFileSays)
 {
     // Lists that contain themselves, one that is in two lists, and two that contain each other.
-    const std::string text =
-        "<?xml version=\"1.0\"?><Test><string name=\"ID\" value=\"top\"/>"
-        "<list name=\"Items\" type=\"obj\"><item value=\"1\"/><item value=\"1\"/><item value=\"2\"/>"
-        "<item value=\"4\"/><item value=\"5\"/></list>" +
-        storedList(1, "<item value=\"2\"/><item value=\"1\"/>") +
-        storedList(2, "<item value=\"2\"/><item value=\"3\"/>") + storedList(4, "<item value=\"5\"/>") +
-        storedList(5, "<item value=\"4\"/>") +
-        "<obj class=\"FPreset\" ID=\"3\"><string name=\"Name\" value=\"self\"/>"
-        "<obj name=\"Object\" ID=\"3\"/></obj></Test>";
     FPresetList list;
     {
         FAttributes tree;
-        ASSERT_TRUE(FXmlArchive(streamOf(text), false).loadAttributes("Test", tree));
+        ASSERT_TRUE(load(listOf(0, {1, 1, 2, 4, 5}) + object("FPresetList", 1, listOf(1, {2, 1})) +
+                             object("FPresetList", 2, listOf(2, {2, 3})) + object("FPreset", 3, presetOf(3)) +
+                             object("FPresetList", 4, listOf(4, {5})) +
+                             object("FPresetList", 5, listOf(5, {4})),
+                         tree));
         EXPECT_TRUE(list.restoreAttributes(tree));
     }
-    EXPECT_EQ(presetsOf(list), "l1(l2(self=?)) l5(l4())");
+    EXPECT_EQ(presetsOf(list), "l1(l2(p=?)) l5(l4())");
     EXPECT_EQ(list.getSubList(0)->getRefCount(), 1u) << "what was refused holds nothing";
     auto copy = adopt(static_cast<FPresetList*>(list.newCopy()));
     EXPECT_EQ(presetsOf(*copy), presetsOf(list));
 }
 
-TEST(FPreset, RefusesAnObjectThatLeadsBackToIt)
+TEST(FPresetPool, HoldsNothingThatLeadsBackToItsHolder)
 {
-    const std::string text =
-        "<?xml version=\"1.0\"?><Test><obj name=\"Preset\" ID=\"1\"/>"
-        "<obj class=\"FPreset\" ID=\"1\"><obj name=\"Object\" ID=\"2\"/></obj>"
-        "<obj class=\"FMultiPreset\" ID=\"2\"><list name=\"Objects\" type=\"obj\">"
-        "<item value=\"3\"/><item value=\"1\"/></list></obj>"
-        "<obj class=\"StoredNode\" ID=\"3\"><int name=\"Number\" value=\"3\"/></obj></Test>";
+    // The second list leads to the pool, and the third by the second. In the first one are several objects, of which
+    // the third leads to all of them, and the fourth by the third; and a list in the older form, whose first preset
+    // holds the list.
+    const auto itemsOf = [](const char* name, const std::string& first, const std::string& second)
+    {
+        return "<list name=\"" + std::string(name) + "\" type=\"list\"><item>" + first + "</item><item>" +
+               second + "</item></list>";
+    };
+    const std::string number = "<int name=\"Number\" value=\"8\"/>";
+    const std::string lists =
+        itemsOf("Lists", listOf(1, {2, 7}), listOf(2, {3}) + "</item><item>" + listOf(3, {10}));
     const int before = StoredNode::alive;
     {
         FAttributes tree;
-        ASSERT_TRUE(FXmlArchive(streamOf(text), false).loadAttributes("Test", tree));
-        const auto* preset = FCast(FPreset, tree.getObject("Preset", "FPreset"));
-        ASSERT_TRUE(preset);
-        EXPECT_EQ(preset->getObject(), nullptr);
+        ASSERT_TRUE(
+            load("<obj name=\"Pool\" ID=\"1\"/>" + object("FPresetPool", 1, lists) +
+                     object("FPreset", 2, presetOf(4)) + object("FPreset", 3, presetOf(1)) +
+                     object("FMultiPreset", 4, objects("Objects", {4, 8, 5, 6})) +
+                     object("FMultiPreset", 5, objects("Objects", {4})) +
+                     object("FMultiPreset", 6, objects("Objects", {5})) +
+                     object("FPresetList", 7, listOf(7, {}) + itemsOf("Presets", presetOf(7), presetOf(9))) +
+                     object("StoredNode", 8, number) + object("StoredNode", 9, number) +
+                     object("FPreset", 10, presetOf(3)),
+                 tree));
+        const auto* pool = FCast(FPresetPool, tree.getObject("Pool", "FPresetPool"));
+        ASSERT_TRUE(pool && pool->countLists() == 1);
+        EXPECT_EQ(presetsOf(*pool->getListAt(0)), "p=? l7(p=8)");
+        const auto* several = FCast(FMultiPreset, pool->getListAt(0)->getPresetObject(0));
+        EXPECT_TRUE(several && several->countObjects() == 1);
     }
-    EXPECT_EQ(StoredNode::alive, before) << "a ring would never be released";
+    EXPECT_EQ(StoredNode::alive, before) << "a circle would never be released";
 }
 
 TEST(FPreset, KeepsObjectsOfClassesThatItDoesNotKnow)
 {
-    const std::string text =
-        "<?xml version=\"1.0\"?><Test><string name=\"Name\" value=\"n\"/>"
-        "<obj name=\"Object\" ID=\"1\"/>"
-        "<obj class=\"FMissing\" ID=\"1\"><int name=\"Level\" value=\"7\"/></obj></Test>";
     FPreset preset;
     {
         FAttributes tree;
-        ASSERT_TRUE(FXmlArchive(streamOf(text), false).loadAttributes("Test", tree));
+        ASSERT_TRUE(load(presetOf(1) + object("FMissing", 1, "<int name=\"Level\" value=\"7\"/>"), tree));
         EXPECT_TRUE(preset.restoreAttributes(tree));
     }
     EXPECT_EQ(preset.getObject(), nullptr);

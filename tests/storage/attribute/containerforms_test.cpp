@@ -10,7 +10,11 @@
 #include "services/components/fcomponentregistry.h"
 #include "storage/attribute/fattributes.h"
 #include "storage/attribute/fnewarchive.h"
+#include "storage/attribute/fobjectlist.h"
+#include "storage/attribute/fxmlinstance.h"
+#include "storage/attribute/fxmlreference.h"
 #include "storage/stream/fmemorystream.h"
+#include "tests/storage/objectfixture.h"
 
 #include <gtest/gtest.h>
 
@@ -53,6 +57,21 @@ bool throughAttributes(const CmObject& object, CmObject& target)
 {
     FAttributes attributes;
     return object.storeAttributes(attributes) && target.restoreAttributes(attributes);
+}
+
+/// An array as an archive has it until somebody asks for it.
+IPtr<FXmlInstance> storedArray()
+{
+    auto tree = adopt(new FAttributes);
+    tree->set("ownership", CmContainer::kTaken);
+    return adopt(new FXmlInstance(1, "CmArray", tree));
+}
+
+void addReference(const FXmlInstance& from, FXmlInstance& to)
+{
+    auto* reference = new FXmlReference(to.getID());
+    reference->setTarget(&to, false);
+    from.getStoredAttributes()->queueObject("obj", reference, true);
 }
 } // namespace
 
@@ -116,6 +135,44 @@ TEST(ContainerForms, KeepWhatCouldBeReadOfATornFile)
         EXPECT_EQ(std::string("one;two;three;").find(textsOf(restored)), 0u);
         EXPECT_EQ(restored.getOwnership(), length < 2 ? 0 : 1);
     }
+}
+
+TEST(ContainerForms, HoldNothingThatLeadsBackToThem)
+{
+    const int before = StoredNode::alive;
+    {
+        const auto first = storedArray(), second = storedArray(), third = storedArray();
+        addReference(*first, *first);
+        first->getStoredAttributes()->queueObject("obj", new StoredNode, true);
+        for (FXmlInstance* element : {second.get(), third.get()})
+            addReference(*first, *element);
+        addReference(*second, *first);
+        addReference(*third, *second);
+        const auto* array = FCast(CmArray, first->getObject("CmArray"));
+        ASSERT_TRUE(array);
+        EXPECT_EQ(array->total(), 1) << "the third leads to the first by the second";
+        EXPECT_TRUE(FCast(StoredNode, array->at(0)));
+        EXPECT_EQ(FCast(CmArray, third->getObject("CmArray"))->total(), 1) << "but closes no circle itself";
+    }
+    {
+        const auto node = adopt(new StoredNode);
+        CmArray array;
+        array.takeElements();
+        FObjectList list;
+        FAttributes tree;
+        CmAssociation pair(node, &pair);
+        for (CmObject* element : {static_cast<CmObject*>(node.get()), static_cast<CmObject*>(&array)})
+            array.add(element);
+        for (CmObject* element : {static_cast<CmObject*>(node.get()), static_cast<CmObject*>(&list)})
+            list.queue(element, false);
+        tree.setObject("node", node);
+        tree.setObject("tree", &tree);
+        for (const CmObject* object : std::initializer_list<CmObject*>{&array, &list, &tree, &pair})
+            EXPECT_EQ(throughArchive(*object), nullptr) << object->isA();
+        array.shareElements();
+        tree.removeAll();
+    }
+    EXPECT_EQ(StoredNode::alive, before) << "a circle would never be released";
 }
 
 TEST(ContainerForms, BaseIsTheModeAlone)

@@ -122,9 +122,9 @@ bool FMultiPreset::restoreAttributes(FAttributes& attributes)
     const auto* stored = attributes.containsAttribute(kObjects)
                              ? FCast(FObjectList, attributes.entry(kObjects).getObj())
                              : nullptr;
+    const RingGuard guard(*this);
     for (int i = 0; stored && i < stored->total(); i++)
     {
-        const RingGuard guard(*this);
         const IPtr<CmObject> object = keepStoredObject(stored->at(i));
         if (!guard.isRing())
             keep(object);
@@ -148,9 +148,9 @@ bool FMultiPreset::internalize(FArchive& archive)
     int count = 0;
     if (!archive.getStream().readBool(isCopy) || !archive.readCount(count))
         return false;
+    const RingGuard guard(*this);
     for (int i = 0; i < count; i++)
     {
-        const RingGuard guard(*this);
         const auto object = adopt(archive.readObject(nullptr, true));
         if (!object || guard.isRing())
             return false;

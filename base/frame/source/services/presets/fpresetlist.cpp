@@ -243,40 +243,28 @@ bool FPresetList::restoreAttributes(FAttributes& attributes)
         return false;
     if (!attributes.get(kName, name))
         name = id;
+    const RingGuard guard(*this);
     attributes.resetQueue(kItems);
-    while (addNextItem(attributes))
-    {
-    }
-    if (items.isEmpty())
-        restoreOlderForm(attributes);
+    while (const auto stored = adopt(attributes.unqueueObject(kItems, "FPresetItem")))
+        if (!guard.isRing())
+            addItem(static_cast<FPresetItem*>(stored.get()));
+    if (!items.isEmpty())
+        return true;
+    restoreMembers<FPreset>(attributes, kOlderPresets, guard);
+    restoreMembers<FPresetList>(attributes, kOlderSubLists, guard);
     return true;
 }
 
-/// False at the end of the items.
-bool FPresetList::addNextItem(FAttributes& attributes)
+/// The older form of the items: trees in a queue for each kind.
+template <class Item>
+void FPresetList::restoreMembers(FAttributes& attributes, const char* key, const RingGuard& guard)
 {
-    const RingGuard guard(*this);
-    const auto stored = adopt(attributes.unqueueObject(kItems, "FPresetItem"));
-    if (stored && !guard.isRing())
-        addItem(IPtr<FPresetItem>(static_cast<FPresetItem*>(stored.get())));
-    return stored != nullptr;
-}
-
-void FPresetList::restoreOlderForm(FAttributes& attributes)
-{
-    attributes.resetQueue(kOlderPresets);
-    for (int i = attributes.countQueueItems(kOlderPresets); i > 0; i--)
+    attributes.resetQueue(key);
+    for (int i = attributes.countQueueItems(key); i > 0; i--)
     {
-        auto preset = adopt(new FPreset);
-        if (attributes.unqueueMember(kOlderPresets, *preset))
-            addItem(preset);
-    }
-    attributes.resetQueue(kOlderSubLists);
-    for (int i = attributes.countQueueItems(kOlderSubLists); i > 0; i--)
-    {
-        auto list = adopt(new FPresetList);
-        if (attributes.unqueueMember(kOlderSubLists, *list))
-            addItem(list);
+        auto item = adopt(new Item);
+        if (attributes.unqueueMember(key, *item) && !guard.isRing())
+            addItem(item);
     }
 }
 
@@ -296,13 +284,13 @@ bool FPresetList::internalize(FArchive& archive)
     int count = 0;
     if (!id.internalize(archive) || !name.internalize(archive) || !archive.readCount(count))
         return false;
+    const RingGuard guard(*this);
     for (int i = 0; i < count; i++)
     {
-        const RingGuard guard(*this);
         const auto item = adopt(archive.readObject("FPresetItem", true));
         if (!item || guard.isRing())
             return false;
-        addItem(IPtr<FPresetItem>(static_cast<FPresetItem*>(item.get())));
+        addItem(static_cast<FPresetItem*>(item.get()));
     }
     return true;
 }

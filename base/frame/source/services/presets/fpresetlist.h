@@ -6,6 +6,8 @@
 
 #include <vector>
 
+class RingGuard;
+
 /// A list of presets, with further lists below it.
 ///
 /// Presets are counted apart from lists, each from 0; an index out of range gives null, false or -1. A copy has items
@@ -76,8 +78,8 @@ protected:
 
 private:
     bool isWithin(const FPresetItem* item) const;
-    bool addNextItem(FAttributes& attributes);
-    void restoreOlderForm(FAttributes& attributes);
+    template <class Item>
+    void restoreMembers(FAttributes& attributes, const char* key, const RingGuard& guard);
 
     // The items by kind, so that an index needs no search.
     std::vector<FPreset*> presets;

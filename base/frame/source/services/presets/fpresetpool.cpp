@@ -4,6 +4,7 @@
 #include "services/presets/fpresetlistownfile.h"
 #include "storage/attribute/farchive.h"
 #include "storage/attribute/fattributes.h"
+#include "storage/attribute/ringguard.h"
 
 DEFINE_CLASS(FPresetPool, CmObject)
 
@@ -72,11 +73,12 @@ bool FPresetPool::storeAttributes(FAttributes& attributes) const
 bool FPresetPool::restoreAttributes(FAttributes& attributes)
 {
     removeAll();
+    const RingGuard guard(*this);
     attributes.resetQueue(kLists);
     for (int i = attributes.countQueueItems(kLists); i > 0; i--)
     {
         auto list = adopt(new FPresetList);
-        if (attributes.unqueueMember(kLists, *list))
+        if (attributes.unqueueMember(kLists, *list) && !guard.isRing())
             addPresetList(list);
     }
     return true;
@@ -98,10 +100,11 @@ bool FPresetPool::internalize(FArchive& archive)
     int count = 0;
     if (!archive.readCount(count))
         return false;
+    const RingGuard guard(*this);
     for (int i = 0; i < count; i++)
     {
         auto list = adopt(archive.readObject("FPresetList", true));
-        if (!list)
+        if (!list || guard.isRing())
             return false;
         addPresetList(FCast(FPresetList, list.get()));
     }

@@ -1,19 +1,12 @@
 #include "containers/keyed/cmassociation.h"
 #include "storage/attribute/farchive.h"
 #include "storage/attribute/fattributes.h"
+#include "storage/attribute/ringguard.h"
 
 namespace
 {
 constexpr const char* kKey = "Key";
 constexpr const char* kObject = "Obj";
-
-CmObject* takeObject(const FAttributes& attributes, const char* key)
-{
-    CmObject* object = attributes.getObject(key, "CmObject");
-    if (object)
-        object->addRef();
-    return object;
-}
 } // namespace
 
 bool CmAssociation::externalize(FArchive& archive) const
@@ -23,8 +16,12 @@ bool CmAssociation::externalize(FArchive& archive) const
 
 bool CmAssociation::internalize(FArchive& archive)
 {
-    CmObject* restoredKey = archive.readObject("CmObject", true);
-    return restorePair(restoredKey, archive.readObject("CmObject", true));
+    const RingGuard guard(*this);
+    auto restoredKey = adopt(archive.readObject("CmObject", true));
+    auto restoredObject = adopt(archive.readObject("CmObject", true));
+    if (guard.isRing())
+        restoredObject = nullptr;
+    return restorePair(restoredKey.take(), restoredObject.take());
 }
 
 bool CmAssociation::storeAttributes(FAttributes& attributes) const
@@ -35,5 +32,10 @@ bool CmAssociation::storeAttributes(FAttributes& attributes) const
 
 bool CmAssociation::restoreAttributes(FAttributes& attributes)
 {
-    return restorePair(takeObject(attributes, kKey), takeObject(attributes, kObject));
+    const RingGuard guard(*this);
+    IPtr<CmObject> restoredKey = attributes.getObject(kKey, "CmObject");
+    IPtr<CmObject> restoredObject = attributes.getObject(kObject, "CmObject");
+    if (guard.isRing())
+        restoredObject = nullptr;
+    return restorePair(restoredKey.take(), restoredObject.take());
 }

@@ -2,6 +2,7 @@
 #include "containers/sequence/cmiterator.h"
 #include "storage/attribute/farchive.h"
 #include "storage/attribute/fattributes.h"
+#include "storage/attribute/ringguard.h"
 #include "storage/stream/fstream.h"
 
 #include <memory>
@@ -28,11 +29,12 @@ bool CmContainer::internalize(FArchive& archive)
     _ownsObjects = kShared;
     int16 mode = kShared;
     int count = 0;
+    const RingGuard guard(*this);
     bool isRead = archive.getStream().readInt16(mode) && archive.readCount(count);
     for (int i = 0; isRead && i < count; i++)
     {
-        CmObject* object = archive.readObject("CmObject", true);
-        isRead = object && addRestored(object);
+        auto object = adopt(archive.readObject("CmObject", true));
+        isRead = object && !guard.isRing() && addRestored(object.take());
     }
     _ownsObjects = mode;
     return isRead;
@@ -54,8 +56,10 @@ bool CmContainer::restoreAttributes(FAttributes& attributes)
     _ownsObjects = kShared;
     int16 mode = kShared;
     attributes.get(kOwnership, mode);
-    while (CmObject* object = attributes.unqueueObject(kElement, "CmObject"))
-        addRestored(object);
+    const RingGuard guard(*this);
+    while (auto object = adopt(attributes.unqueueObject(kElement, "CmObject")))
+        if (!guard.isRing())
+            addRestored(object.take());
     _ownsObjects = mode;
     return true;
 }

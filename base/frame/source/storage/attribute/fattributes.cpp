@@ -7,6 +7,7 @@
 #include "storage/attribute/fattrbuffer.h"
 #include "storage/attribute/fcmobjectstripper.h"
 #include "storage/attribute/fxmlobject.h"
+#include "storage/attribute/ringguard.h"
 #include "storage/stream/fmemorystream.h"
 
 #include <algorithm>
@@ -403,7 +404,12 @@ bool FAttributes::externalize(FArchive& archive) const
 bool FAttributes::internalize(FArchive& archive)
 {
     entries = adopt(new FStringAttributeList);
-    return entries->internalize(archive);
+    const RingGuard guard(*this);
+    const bool isRead = entries->internalize(archive);
+    if (!guard.isRing())
+        return isRead;
+    entries = nullptr;
+    return false;
 }
 
 bool FAttributes::storeAttributes(FAttributes& attributes) const

@@ -3,6 +3,7 @@
 #include "foundation/object/fvariant.h"
 #include "storage/attribute/farchive.h"
 #include "storage/attribute/fxmlobject.h"
+#include "storage/attribute/ringguard.h"
 
 DEFINE_CLASS(FObjectList, FAttrList)
 
@@ -43,12 +44,13 @@ bool FObjectList::internalize(FArchive& archive)
     int count = 0;
     if (!archive.readCount(count))
         return false;
+    const RingGuard guard(*this);
     for (int i = 0; i < count; i++)
     {
-        CmObject* object = archive.readObject("CmObject", true);
-        if (!object)
+        const auto object = adopt(archive.readObject("CmObject", true));
+        if (!object || guard.isRing())
             return false;
-        queue(object, true);
+        queue(object, false);
     }
     return true;
 }

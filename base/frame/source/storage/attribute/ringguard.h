@@ -4,8 +4,10 @@
 
 /// Finds rings that a damaged file would make: objects that hold one another are never released.
 ///
-/// Stands around the reading of something that `holder` is to hold. If a reference to the holder was taken meanwhile,
-/// what was read leads back to it, by however many objects, and must not be held. One thread at a time.
+/// Stands around the reading of all that `holder` is to hold, and is asked about each object when that is read. While
+/// the holder has more references than at first, the object may lead back to it, by however many others, and must not
+/// be held. A refused object that goes at once spoils nothing; one that lives on in the archive, with its reference to
+/// the holder, spoils all that follow, for they may lead to it. One thread at a time.
 class RingGuard
 {
 public:
