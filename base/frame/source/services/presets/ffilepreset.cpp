@@ -17,8 +17,7 @@ FFilePreset::FFilePreset(const FNPath& file) : path(file)
 FFilePreset::FFilePreset(const FNPath& file, CmObject* itsObject, uint32 itsFlags)
     : FPreset(nullptr, itsObject, itsFlags),
       path(file),
-      isRead(true),
-      hasFlags(true)
+      isRead(true)
 {
     takeName();
 }
@@ -40,6 +39,19 @@ void FFilePreset::unuse()
 {
     object = nullptr;
     isRead = false;
+}
+
+bool FFilePreset::resetRenamed()
+{
+    read();
+    if (!isRenamed())
+        return true;
+    setFlag(kRenamed, false);
+    // A file that can't be read is not written over.
+    if (!object || write())
+        return true;
+    setFlag(kRenamed, true);
+    return false;
 }
 
 bool FFilePreset::write()
@@ -76,7 +88,6 @@ bool FFilePreset::storeAttributes(FAttributes& attributes) const
 bool FFilePreset::restoreAttributes(FAttributes& attributes)
 {
     const FString fileName(name);
-    const uint32 knownFlags = flags;
     FPreset::restoreAttributes(attributes);
     bool canModify = mayBeModified();
     attributes.get(kCanModify, canModify);
@@ -84,8 +95,5 @@ bool FFilePreset::restoreAttributes(FAttributes& attributes)
     if (!(name == fileName))
         setFlag(kRenamed, true);
     name = fileName;
-    if (hasFlags)
-        flags = knownFlags;
-    hasFlags = true;
     return true;
 }

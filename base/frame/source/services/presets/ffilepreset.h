@@ -12,10 +12,12 @@ class FFilePreset : public FPreset
     explicit FFilePreset(const FNPath& file);
     FFilePreset(const FNPath& file, CmObject* itsObject, uint32 itsFlags);
 
-    /// Reads the file, unless that was done or tried. Flags that were read once stay as they are.
+    /// Reads the file, unless that was done or tried.
     void read();
     /// Drops the object; it is read again when it is asked for.
     void unuse();
+    /// Writes the file anew. False, with all as it was, where that fails.
+    bool resetRenamed();
     // The file. False where that fails.
     bool write();
     bool remove();
@@ -31,5 +33,4 @@ private:
 
     FNPath path;
     bool isRead = false;
-    bool hasFlags = false;
 };

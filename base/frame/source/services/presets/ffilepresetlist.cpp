@@ -99,8 +99,8 @@ bool FFilePresetList::presetRenamed(int index)
 
 bool FFilePresetList::resetRenameState(int index)
 {
-    readPreset(index);
-    return FPresetList::resetRenameState(index);
+    FFilePreset* preset = filePreset(index);
+    return preset && preset->resetRenamed();
 }
 
 bool FFilePresetList::setPresetName(int index, const char16* presetName)

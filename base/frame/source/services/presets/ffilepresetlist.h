@@ -29,6 +29,7 @@ class FFilePresetList : public FPresetList
     bool setPresetName(int index, const char16* presetName) override;
     bool canModifiyPreset(int index) override;
     bool presetRenamed(int index) override;
+    /// Writes the file anew. False, with all as it was, where that fails.
     bool resetRenameState(int index) override;
     /// Writes a new file. The name is made valid, and numbered where it is taken.
     int addPreset(CmObject* object, const char16* presetName, bool mayBeModified = true,
