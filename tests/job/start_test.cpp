@@ -57,7 +57,7 @@ TEST_F(Start, SpeaksTheLanguageOfTheDescriptionAndRemembersIt)
     EXPECT_EQ(contentsOf(userFile("language")), attributeFile("language", {{"language", "de"}}));
 }
 
-TEST_F(Start, LoadsTheSettingsAndSavesThemAtTheEnd)
+TEST_F(Start, LoadsSettingsAndPresetsAndSavesThemAtTheEnd)
 {
     const std::string settings =
         "<Defaults><rootObjects><root name=\"Defaults\"><list name=\"Entries\" type=\"list\"><item>"
@@ -65,11 +65,17 @@ TEST_F(Start, LoadsTheSettingsAndSavesThemAtTheEnd)
         "<member name=\"Values\"><int name=\"k\" value=\"7\"/></member>"
         "</item></list></root></rootObjects></Defaults>";
     writeUserFile("Defaults", settings);
+    std::filesystem::create_directory(userFolder / "Presets");
+    writeUserFile("Presets/RAMPresets",
+                  "<Presets><rootObjects><root name=\"Pool\" ID=\"1\"/></rootObjects>"
+                  "<obj class=\"FPresetPool\" ID=\"1\"><list name=\"Lists\" type=\"list\"><item>"
+                  "<string name=\"ID\" value=\"sounds\"/></item></list></obj></Presets>");
     run({});
     const std::string saved = contentsOf(userFile("Defaults"));
     EXPECT_HOLDS(saved, "<string name=\"Group\" value=\"g\"/>\r");
     EXPECT_HOLDS(saved, "<int name=\"k\" value=\"7\"/>\r");
     EXPECT_FALSE(exists(userFile("Defaults_old")));
+    EXPECT_HOLDS(contentsOf(userFile("Presets/RAMPresets")), "<string name=\"Name\" value=\"sounds\"");
 
     std::filesystem::remove(userFile("Defaults"));
     run({});
