@@ -8,6 +8,8 @@
 namespace
 {
 constexpr char16 kReplacement = u'_';
+/// A name that is taken gets a number, for which the longest ones have room.
+constexpr const char* kRoomForNumber = "-9999";
 /// Has another extension than what is read.
 constexpr const char16* kUnfinished = u"Presets.tmp";
 
@@ -107,7 +109,8 @@ FString PresetFiles::validName(const char16* text)
 FString PresetFiles::fileName(const char16* text, const char* extension)
 {
     FString result = validName(text);
-    result.append(u'.').append(extension);
+    result.append(u'.').append(extension).append(kRoomForNumber);
     FNFileSystem::makeSystemName(result);
+    result.remove(result.length() - ConstString(kRoomForNumber).length());
     return result;
 }
