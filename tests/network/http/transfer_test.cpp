@@ -1,6 +1,9 @@
+#include "network/http/furlstream.h"
 #include "network/http/httprequest.h"
 #include "tests/network/http/httpfixture.h"
 #include "tests/network/http/peer.h"
+
+#include <utility>
 
 namespace
 {
@@ -20,6 +23,30 @@ std::string locationReply(const std::string& url, const char* status = "302")
 
 class Transfer : public HttpTest
 {
+};
+
+/// Takes only a part of a request.
+class NarrowStream : public FUrlStream
+{
+    DECLARE_TYPE(NarrowStream, FUrlStream)
+
+    bool open(const char*, uint16, int) override { return true; }
+
+protected:
+    int receiveSome(char*, int) override { return 0; }
+    int sendSome(const char*, int size) override { return std::exchange(room, 0) > 0 ? size / 2 : -1; }
+
+private:
+    int room = 1;
+};
+
+class NarrowHandler : public FUrlHttpHandler
+{
+public:
+    using FUrlHttpHandler::FUrlHttpHandler;
+
+protected:
+    FUrlStream* newStream() override { return new NarrowStream; }
 };
 } // namespace
 
@@ -152,6 +179,15 @@ TEST_F(Transfer, TakesAReplyThatIsCutAnywhere)
     }
 }
 
+TEST_F(Transfer, EndsWhereTheRequestDoesNotGoOutWhole)
+{
+    FUrl url(u"http://h/x");
+    const auto handler = adopt(new NarrowHandler(url));
+    EXPECT_FALSE(handler->open());
+    EXPECT_EQ(handler->getStream(), nullptr);
+    EXPECT_FALSE(handler->close());
+}
+
 // Through a proxy
 
 TEST_F(Transfer, AsksTheProxyForTheWholeUrl)
@@ -180,8 +216,8 @@ TEST_F(Transfer, TellsTheProxyWhoItIsWhenAskedOrTold)
     EXPECT_TRUE(get("http://h.invalid/").isOpen);
     set("Use Proxy Authentication", 1);
     EXPECT_FALSE(get("http://h.invalid/").isOpen) << "what was refused isn't sent again and again";
-    EXPECT_EQ(proxy.requests(),
-              (Lines{begin + kAgent, begin + credentials + kAgent, begin + credentials + kAgent}));
+    const std::string known = begin + credentials + kAgent;
+    EXPECT_EQ(proxy.requests(), (Lines{begin + kAgent, known, known, known}));
 
     set("Use Proxy", 0);
     Peer direct({refusal});
@@ -249,4 +285,20 @@ TEST_F(Transfer, KeepsCredentialsFromOtherServers)
     EXPECT_NE(peer.requests()[2].find(authorization), std::string::npos) << "the same server";
     ASSERT_EQ(stranger.requests().size(), 1u);
     EXPECT_EQ(stranger.requests()[0].find("Authorization"), std::string::npos) << "another port";
+
+    // The handler stays when the URL's owner names another server.
+    Peer first({refusal, "HTTP/1.0 200 OK\r\n\r\n"});
+    FUrl url(wide(first.url()).text16());
+    const auto handler = adopt(new Asked<FUrlHttpHandler>(url));
+    handler->user = [](FString& name, FString& secret)
+    {
+        name = u"ada";
+        secret = u"secret";
+        return true;
+    };
+    EXPECT_TRUE(get(url, *handler).isOpen);
+    url.setUrl(wide(stranger.url()).text16());
+    EXPECT_TRUE(get(url, *handler).isOpen);
+    EXPECT_EQ(handler->questions, 1);
+    EXPECT_EQ(stranger.requests().back().find("Authorization"), std::string::npos);
 }

@@ -118,6 +118,9 @@ FUrlHttpHandler::Next FUrlHttpHandler::exchange()
     closeStream();
     length = 0;
     redirected.assign(u"");
+    // A redirection, or who owns the URL, may have named another server since the user typed.
+    if (!isUsersServer())
+        forgetUser();
     const HttpProxy proxy = HttpProxy::fromDefaults();
     const Next connected = connect(proxy);
     if (connected != Next::kDone)
@@ -218,19 +221,15 @@ FUrlHttpHandler::Next FUrlHttpHandler::readReply(const HttpProxy& proxy)
 
 FUrlHttpHandler::Next FUrlHttpHandler::redirect(const FString& location)
 {
-    const FString host(url.getHost());
-    const int16 port = url.getPort();
     url.setUrl(location.text16());
     closeStream();
-    if (port != url.getPort() || host.compare(url.getHost(), kCaseInsensitive) != 0)
-        forgetUser();
     const bool isOwn = url.getProtocol() == ConstString(getOwnProtocol());
     return isOwn && !isCancelled() ? Next::kAgain : Next::kFailed;
 }
 
 bool FUrlHttpHandler::willAuthenticateToProxy(const HttpProxy& proxy)
 {
-    if (!proxy.isUsed() || proxyAuthenticated || proxy.authenticate)
+    if (!proxy.isUsed() || proxyAuthenticated)
         return false;
     proxyAuthenticated = true;
     return true;
@@ -242,6 +241,8 @@ FUrlHttpHandler::Next FUrlHttpHandler::authenticate()
 {
     closeStream();
     authenticated = true;
+    userHost = url.getHost();
+    userPort = url.getPort();
     // A URL may bring along what the user is shown first.
     if (user.isEmpty())
     {
@@ -252,6 +253,11 @@ FUrlHttpHandler::Next FUrlHttpHandler::authenticate()
         return Next::kAgain;
     forgetUser();
     return Next::kFailed;
+}
+
+bool FUrlHttpHandler::isUsersServer() const
+{
+    return userPort == url.getPort() && userHost.compare(url.getHost(), kCaseInsensitive) == 0;
 }
 
 void FUrlHttpHandler::forgetUser()

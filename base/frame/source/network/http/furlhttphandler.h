@@ -67,8 +67,11 @@ protected:
     /// Makes the stream and connects it.
     bool openStream(const FString& host, uint16 port);
     bool send(const HttpRequest& request);
+    /// For requests that a proxy gets: a server that is reached without one must never see these credentials.
     void addProxyCredentials(HttpRequest& request, const HttpProxy& proxy) const;
-    /// The credentials for the proxy go out with the next run, if they didn't with this one.
+    /// Whether a 407 makes the request go out again, now with the credentials for the proxy. It does so once: a proxy
+    /// that doesn't like them would be asked for ever, and no user is there to change them. It doesn't for a 407 of a
+    /// server that is no proxy, to which there is nothing to add. Such a reply is an error like any other.
     bool willAuthenticateToProxy(const HttpProxy& proxy);
 
 private:
@@ -81,6 +84,7 @@ private:
     bool ask();
     bool isCancelled();
     bool closeStream();
+    bool isUsersServer() const;
     void forgetUser();
 
     FString redirected;
@@ -90,6 +94,9 @@ private:
     FString password;
     bool dialogResult = false;
     FCondition answered{"authentication"};
+    // Whom the user's name and password are for.
+    FString userHost;
+    int16 userPort = 0;
     int stallLimit;
     // Guards the stream's pointer, what follows, and the answer to a question.
     FLock lock{"http handler"};

@@ -5,8 +5,8 @@
 /// The proxy that the user's settings name for all requests of HTTP.
 struct HttpProxy
 {
-    /// The settings as they are now, by default none. They are read without a lock, so nobody may change them while
-    /// a transfer begins.
+    /// The settings as they are now, by default none. They are read without a lock and for each request of a run, so
+    /// nobody may change settings while a handler opens.
     static HttpProxy fromDefaults();
 
     bool isUsed() const { return !host.isEmpty(); }
