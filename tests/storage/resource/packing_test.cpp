@@ -1,6 +1,7 @@
 #include "foundation/thread/fthread.h"
 #include "resourcefixture.h"
 #include "storage/filesystem/ffileiterator.h"
+#include "storage/resource/farchiveprogress.h"
 #include "storage/resource/resourcecheck.h"
 #include "storage/stream/uprogresshook.h"
 #include "storage/virtual/farchivemanager.h"
@@ -45,6 +46,17 @@ TEST_F(ResourceTest, TellsHowFarItHasCome)
     Progress extracting;
     EXPECT_TRUE(opened("a.qzr")->extractAll(*at("out", FPath::kFolder), &extracting));
     EXPECT_EQ(extracting.value, packing.maximum);
+}
+
+TEST(FArchiveProgress, KeepsGreatTotalsIn31Bits)
+{
+    Progress outer;
+    FArchiveProgress progress(&outer, 50000000000);
+    EXPECT_EQ(outer.getValueCompression(), 100);
+    EXPECT_EQ(outer.maximum, 500000000);
+    progress.nextFile(u"one")->setValue(30000000000);
+    progress.nextFile(u"two")->setValue(20000000000);
+    EXPECT_EQ(outer.value, outer.maximum);
 }
 
 TEST_F(ResourceTest, ACancelledPackingLeavesNoFile)

@@ -25,7 +25,7 @@ class FFileArchive : public FFileSystem
     enum Flags
     {
         kPrivateCache = 1, ///< no other archive of the same name shares the cache folder
-        kOwnHandles = 2,   ///< each stream has a handle of its own on the file
+        kOwnHandles = 2,   ///< each stream has its own handle; nobody may replace the file meanwhile
         kBuffered = 4      ///< the archive's own handle is read through a cache of one block
     };
 
