@@ -114,6 +114,18 @@ TEST_F(ResourceTest, FilesOutsideTheDataAreNotThere)
     EXPECT_EQ(read(*archive, u"good"), "12345");
 }
 
+TEST_F(ResourceTest, TheSameBytesAreNotNamedWithoutEnd)
+{
+    ForgedFile forged;
+    forged.file(u"content", std::string(1000, 'x').c_str());
+    for (int i = 0; i < 1000; i++)
+        forged.entry(FResourceEntry::kFile, 25, 1000, FString(std::to_string(i).c_str()).text16());
+    put("a.qzr", forged.bytes());
+    const IPtr<FResourceArchive> archive = opened("a.qzr");
+    EXPECT_EQ(listing(*archive), "/content ");
+    EXPECT_EQ(archive->getDamage(), 1000);
+}
+
 TEST_F(ResourceTest, FoldersDoNotGrowWithoutEnd)
 {
     ForgedFile forged;
@@ -200,6 +212,7 @@ TEST_F(ResourceTest, TheCheckFindsWhatOverlapsAndWhatIsThereTwice)
 {
     ForgedFile forged;
     forged.file(u"a", "12345");
+    forged.data.writeString8("a gap", false);
     forged.entry(FResourceEntry::kFile, 27, 2, u"b");
     forged.entry(FResourceEntry::kFile, 25, 0, u"b");
     put("a.qzr", forged.bytes());

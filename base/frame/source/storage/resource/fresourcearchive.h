@@ -92,6 +92,8 @@ private:
     IPtr<FResourceEntry> readEntry(FStream& table);
     bool readNumber(FStream& table, int64& number) const;
     bool isPlausible(const FResourceEntry& entry) const;
+    /// Whether the entry makes sense, beside those before it: together they hold no more than the file.
+    bool claimContent(const FResourceEntry& entry);
     void forget();
 
     // Writing
@@ -113,6 +115,8 @@ private:
     float quality = kDefaultQuality;
     int formatVersion = 0;
     int64 contentEnd = 0;
+    /// While the table is read: the bytes of content that no entry has named yet.
+    int64 unclaimed = 0;
     int damage = 0;
     bool warns = false;
     bool isWriting = false;

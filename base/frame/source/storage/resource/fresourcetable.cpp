@@ -24,6 +24,7 @@ bool FResourceArchive::readTable(const ResourceFileEnding& ending)
 {
     const IPtr<FResourceEntry> top = adopt(new FResourceEntry(u"", FResourceEntry::kFolder));
     root = top.get();
+    unclaimed = contentEnd - kResourceHeaderSize;
     if (ending.tableSize == 0)
     {
         damage = ending.entryCount == 0 ? 0 : 1;
@@ -51,7 +52,7 @@ uint32 FResourceArchive::unpackContentTable(FResourceEntry& parent, FStream& tab
         used++;
         if (closesFolder(*entry))
             break;
-        if (!isPlausible(*entry))
+        if (!claimContent(*entry))
         {
             damage++;
             continue;
@@ -100,6 +101,19 @@ bool FResourceArchive::readNumber(FStream& table, int64& number) const
     const bool isRead = table.readInt32u(narrow);
     number = narrow;
     return isRead;
+}
+
+bool FResourceArchive::claimContent(const FResourceEntry& entry)
+{
+    if (!isPlausible(entry))
+        return false;
+    if (entry.isFolder())
+        return true;
+    // Without this, a small file could name the same bytes again and again and be extracted without end.
+    if (entry.getDataSize() > unclaimed)
+        return false;
+    unclaimed -= entry.getDataSize();
+    return true;
 }
 
 bool FResourceArchive::isPlausible(const FResourceEntry& entry) const
