@@ -31,7 +31,10 @@ protected:
     void deliver()
     {
         askedForHello = gMessenger->messagesPosted(&messenger, kSendHalloMsg);
-        gMessenger->deliverMessages();
+        // A hello waits for a while.
+        do
+            gMessenger->deliverMessages();
+        while (gMessenger->areMessagesPosted(&messenger, kSendHalloMsg));
     }
     int countPeers()
     {

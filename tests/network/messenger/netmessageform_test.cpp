@@ -1,5 +1,6 @@
 #include "containers/sequence/cmlinkedlist.h"
 #include "network/messenger/netmessageform.h"
+#include "network/messenger/netmessagenames.h"
 #include "network/socket/naddress.h"
 #include "storage/stream/fmemorystream.h"
 #include "tests/network/everykind.h"
@@ -63,18 +64,28 @@ TEST(NetMessageForm, CarriesEveryKindOfValue)
     message->addPointer("pointer", &here);
     FMemoryStream stream;
     EXPECT_FALSE(writeNetMessage(stream, "inbox", *message)) << "an address means nothing elsewhere";
-    EXPECT_FALSE(copyForNetwork(*message));
+    EXPECT_FALSE(bytesForNetwork("inbox", *message));
 }
 
-TEST(NetMessageForm, CopiesShareNothing)
+TEST(NetMessageForm, GetsTheTimeOfSendingAndKeepsTheRest)
 {
-    FMessage message("m");
-    const auto text = adopt(new CmString("before"));
-    message.add("text", text, true);
-    const auto copy = copyForNetwork(message);
-    text->assign("after");
-    ASSERT_TRUE(copy);
-    EXPECT_STREQ(copy->getString8("text"), "before");
+    const WordComponents components;
+    const auto bytes = bytesForNetwork("inbox", *makeEveryKind("kinds"));
+    ASSERT_TRUE(bytes);
+    const std::string before = contentOf(*bytes);
+    const auto stamped = withSentTime(*bytes, 77);
+    ASSERT_TRUE(stamped);
+    EXPECT_EQ(hex(contentOf(*bytes)), hex(before)) << "others are sending them";
+    stamped->rewind();
+    FString receiver;
+    const auto read = readNetMessage(*stamped, receiver);
+    ASSERT_TRUE(read);
+    EXPECT_STREQ(receiver.text8(), "inbox");
+    int64 time = 0;
+    EXPECT_TRUE(read->getSentTime(time));
+    EXPECT_EQ(time, 77);
+    read->remove(kNetSentStamp);
+    EXPECT_EQ(differenceFromEveryKind(*read, "kinds"), "");
 }
 
 TEST(NetMessageForm, DropsMessagesThatAreCutOrDamaged)
@@ -126,6 +137,12 @@ TEST(NetMessageForm, LimitsTheObjects)
     EXPECT_TRUE(readFrom(bytesOf(message)));
     list->add(new CmString("x"));
     EXPECT_FALSE(readFrom(bytesOf(message)));
+    EXPECT_FALSE(bytesForNetwork("inbox", message)) << "nobody would take it";
+
+    FMessage large("m");
+    const std::string text(static_cast<size_t>(kMaxNetMessage), 'x');
+    large.addString8("text", text.c_str());
+    EXPECT_FALSE(bytesForNetwork("inbox", large));
 }
 
 TEST(NMessage, KeepsTimeStampsAndTheSender)

@@ -1,4 +1,5 @@
 #include "application/applicationsteps.h"
+#include "foundation/thread/fworkclass.h"
 #include "messengerfixture.h"
 #include "network/messenger/netmessageform.h"
 #include "network/messenger/nmessagerecvthread.h"
@@ -206,6 +207,36 @@ TEST_F(ExchangeTest, ManyMessagesAreAllSentBeforeItStops)
         });
     deliverUntil([&] { return inbox.received.size() == kCount; });
     sender.join();
+}
+
+TEST(NWorkCrew, EndsUndoneWhatComesTooFast)
+{
+    struct Work final : FWorkClass
+    {
+        Work(FCondition& gate, std::atomic<size_t>& ended) : opens(gate), count(ended) {}
+        void performThreadWork(void*) override
+        {
+            opens.wait();
+            opens.signal();
+        }
+        void finished() override
+        {
+            count++;
+            delete this;
+        }
+        FCondition& opens;
+        std::atomic<size_t>& count;
+    };
+    constexpr size_t kRoom = NWorkCrew::kMaxThreads + NWorkCrew::kMaxWaiting;
+    FCondition gate;
+    std::atomic<size_t> ended = 0;
+    NWorkCrew crew("held", kThreadPriorityLow);
+    for (size_t i = 0; i < kRoom + 3; i++)
+        crew.add(new Work(gate, ended));
+    EXPECT_EQ(ended, 3u);
+    gate.signal();
+    crew.end(0);
+    EXPECT_EQ(ended, kRoom + 3);
 }
 
 TEST_F(ExchangeTest, APeerCanTellOfItself)

@@ -16,6 +16,19 @@ void ownElements(const FSimpleArchive& archive)
                 container->takeElements();
 }
 
+IPtr<FMemoryStream> writeWithinLimit(const char* receiver, const FMessage& message)
+{
+    auto bytes = adopt(new FMemoryStream);
+    const bool isWritten = writeNetMessage(*bytes, receiver, message);
+    return isWritten && bytes->getSize() <= kMaxNetMessage ? bytes : nullptr;
+}
+
+IPtr<NMessage> readBytes(const FMemoryStream& bytes, FString& receiver)
+{
+    FMemoryStream reading(bytes.getData(), bytes.getSize());
+    return readNetMessage(reading, receiver);
+}
+
 bool readParts(FSimpleArchive& archive, FString& receiver, NMessage& message)
 {
     int32 zero = 0;
@@ -40,12 +53,19 @@ IPtr<NMessage> readNetMessage(FStream& stream, FString& receiver)
     return isRead ? message : nullptr;
 }
 
-IPtr<NMessage> copyForNetwork(const FMessage& message)
+IPtr<FMemoryStream> bytesForNetwork(const char* receiver, const FMessage& message)
 {
-    FMemoryStream stream;
-    if (!writeNetMessage(stream, "", message) || stream.getSize() > kMaxNetMessage)
-        return nullptr;
-    stream.rewind();
+    const IPtr<FMemoryStream> bytes = writeWithinLimit(receiver, message);
+    FString readReceiver;
+    return bytes && readBytes(*bytes, readReceiver) ? bytes : nullptr;
+}
+
+IPtr<FMemoryStream> withSentTime(const FMemoryStream& bytes, int64 microseconds)
+{
     FString receiver;
-    return readNetMessage(stream, receiver);
+    const IPtr<NMessage> message = readBytes(bytes, receiver);
+    if (!message)
+        return nullptr;
+    message->setSentTime(microseconds);
+    return writeWithinLimit(receiver.text8(), *message);
 }

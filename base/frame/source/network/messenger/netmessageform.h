@@ -3,6 +3,7 @@
 #include "foundation/object/iptr.h"
 #include "network/messenger/nmessage.h"
 
+class FMemoryStream;
 class FStream;
 class FString;
 
@@ -20,5 +21,8 @@ bool writeNetMessage(FStream& stream, const char* receiver, const FMessage& mess
 /// else would.
 IPtr<NMessage> readNetMessage(FStream& stream, FString& receiver);
 
-/// A copy that shares nothing with the original; null where a value can't be sent.
-IPtr<NMessage> copyForNetwork(const FMessage& message);
+/// The bytes of a message; null where a value can't be sent or the other side would refuse them.
+IPtr<FMemoryStream> bytesForNetwork(const char* receiver, const FMessage& message);
+
+/// The bytes of the same message with the moment of its sending; null where that makes it too large.
+IPtr<FMemoryStream> withSentTime(const FMemoryStream& bytes, int64 microseconds);

@@ -6,12 +6,10 @@
 #include "storage/stream/fmemorystream.h"
 #include "storage/url/furlhandler.h"
 
-NetMessageWork::NetMessageWork(NMessenger& owner, const FUrl& target, const char* receiverName,
-                               const IPtr<NMessage>& messageCopy)
+NetMessageWork::NetMessageWork(NMessenger& owner, const FUrl& target, const IPtr<FMemoryStream>& messageBytes)
     : messenger(owner),
       url(adopt(new FUrl(target))),
-      receiver(receiverName),
-      message(messageCopy)
+      bytes(messageBytes)
 {
     // Made here, since `cancelWork` needs it on another thread.
     url->makeHandler();
@@ -19,22 +17,20 @@ NetMessageWork::NetMessageWork(NMessenger& owner, const FUrl& target, const char
 
 void NetMessageWork::performThreadWork(void*)
 {
-    if (IMicrosecondsTimer* timer = messenger.getTimer())
-        message->setSentTime(timer->getMicroseconds());
-    const auto bytes = adopt(new FMemoryStream);
-    if (!writeNetMessage(*bytes, receiver.text8(), *message) || bytes->getSize() > kMaxNetMessage)
-        return;
-    if (!send(*bytes) && !cancelled)
+    IMicrosecondsTimer* timer = messenger.getTimer();
+    const IPtr<FMemoryStream> toSend = timer ? withSentTime(*bytes, timer->getMicroseconds()) : bytes;
+    if (toSend && !send(*toSend) && !cancelled)
         messenger.removeReceiver(url->getHost().text8(), static_cast<uint16>(url->getPort()));
 }
 
 /// False where the connection fails.
-bool NetMessageWork::send(FStream& bytes)
+bool NetMessageWork::send(const FMemoryStream& toSend)
 {
     FUrlHandler* handler = url->getHandler();
     if (!handler || !handler->open())
         return false;
-    const bool isSent = handler->getStream()->copyFrom(bytes);
+    const int64 size = toSend.getSize();
+    const bool isSent = handler->getStream()->writeRaw(toSend.getData(), size) == size;
     handler->close();
     return isSent;
 }

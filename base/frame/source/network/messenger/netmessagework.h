@@ -2,30 +2,29 @@
 
 #include "foundation/object/iptr.h"
 #include "foundation/thread/fworkclass.h"
-#include "network/messenger/nmessage.h"
 #include "storage/url/furl.h"
 
 #include <atomic>
 
+class FMemoryStream;
 class NMessenger;
 
-/// Sends one message to one program. The messenger is borrowed, the message held.
+/// Sends one message to one program. The messenger is borrowed. The bytes of the message are held, and are never
+/// changed, so that all the works of a message share them.
 class NetMessageWork final : public FWorkClass
 {
 public:
-    NetMessageWork(NMessenger& owner, const FUrl& target, const char* receiverName,
-                   const IPtr<NMessage>& messageCopy);
+    NetMessageWork(NMessenger& owner, const FUrl& target, const IPtr<FMemoryStream>& messageBytes);
 
     void performThreadWork(void* data) override;
     void finished() override { delete this; }
     void cancelWork() override;
 
 private:
-    bool send(FStream& bytes);
+    bool send(const FMemoryStream& toSend);
 
     NMessenger& messenger;
     IPtr<FUrl> url;
-    FString receiver;
-    IPtr<NMessage> message;
+    IPtr<FMemoryStream> bytes;
     std::atomic<bool> cancelled{false};
 };

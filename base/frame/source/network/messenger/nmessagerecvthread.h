@@ -42,7 +42,8 @@ public:
     ~NMessageRecvThread() override;
 
     /// Begins to listen; false where the port can't be had.
-    bool open() { return server.open(); }
+    /// A connection that goes before it is taken must not hold up the others: the server never waits by itself.
+    bool open() { return server.open(0); }
     /// The port in use.
     uint16 getPort() const { return server.getLocalPort(); }
     void setStallLimit(int milliseconds) { stallLimit = milliseconds; }

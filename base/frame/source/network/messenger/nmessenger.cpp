@@ -10,6 +10,7 @@
 #include "network/messenger/nreceiver.h"
 #include "network/messenger/nurlmsghandler.h"
 #include "network/socket/naddresslookup.h"
+#include "storage/stream/fmemorystream.h"
 
 #include <algorithm>
 
@@ -22,6 +23,8 @@ namespace
 constexpr int kGrace = 2000;
 /// As many hellos may wait for one object; further ones come too fast to be of use.
 constexpr int kMaxWaitingNews = 64;
+/// Pulses that a hello waits, so that however many programs are heard of, there are a few hellos a second.
+constexpr int kHelloDelay = 15;
 } // namespace
 
 NMessenger::NMessenger()
@@ -190,7 +193,7 @@ void NMessenger::peerChanged(bool isThere, NMessage& message)
     FMessenger* messenger = gMessenger;
     // A program that we didn't know doesn't know us.
     if (entering == kEntered && messenger)
-        messenger->postMessage(this, new FMessage(kSendHalloMsg), true);
+        messenger->postMessage(this, new FMessage(kSendHalloMsg), true, kHelloDelay);
 }
 
 void NMessenger::tellGroup(NMessage& message)
@@ -211,12 +214,15 @@ void NMessenger::sendMessage(const char* receiver, FMessage* message)
 {
     CmLinkedList peers;
     peers.takeElements();
-    copyReceivers(peers);
-    for (CmLinkedListIterator it(peers); !it.done(); it.next())
+    if (!receiver || !message || copyReceivers(peers) == 0)
+        return;
+    // Written once: anybody can enter peers, and none may cost more than a place in the queue.
+    const IPtr<FMemoryStream> bytes = bytesForNetwork(receiver, *message);
+    for (CmLinkedListIterator it(peers); bytes && !it.done(); it.next())
     {
         const auto url = adopt(new FUrl);
         static_cast<NReceiver*>(it.current())->getUrl(*url);
-        sendMessageTo(url, receiver, message);
+        sending.add(new NetMessageWork(*this, *url, bytes));
     }
 }
 
@@ -224,10 +230,10 @@ bool NMessenger::sendMessageTo(FUrl* url, const char* receiver, FMessage* messag
 {
     if (!url || !receiver || !message)
         return false;
-    const IPtr<NMessage> copy = copyForNetwork(*message);
-    if (copy)
-        sending.add(new NetMessageWork(*this, *url, receiver, copy));
-    return copy != nullptr;
+    const IPtr<FMemoryStream> bytes = bytesForNetwork(receiver, *message);
+    if (bytes)
+        sending.add(new NetMessageWork(*this, *url, bytes));
+    return bytes != nullptr;
 }
 
 int NMessenger::notify(FMessage* message)

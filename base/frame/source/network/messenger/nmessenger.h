@@ -73,8 +73,9 @@ class NMessenger : public CmObject, public INetworkMessenger
 
     // Messages
 
-    /// Sends a copy to the object that is registered under this name at each known peer; peers without one drop it. The
-    /// sending goes on after the return, in no set order.
+    /// Sends the message as it is now to the object that is registered under this name at each known peer; peers
+    /// without one drop it. The sending goes on after the return, in no set order. What comes too fast for the network
+    /// is dropped.
     void sendMessage(const char* receiver, FMessage* message) override;
     /// Sends to the peer of this URL alone. False where the message has a value that can't be sent, or is too large.
     bool sendMessageTo(FUrl* url, const char* receiver, FMessage* message);

@@ -46,7 +46,10 @@ void NWorkCrew::add(FWorkClass* work)
     idle = takeIdle();
     if (workers.size() >= kMaxThreads)
     {
-        waiting.push_back(work);
+        if (waiting.size() < kMaxWaiting)
+            waiting.push_back(work);
+        else
+            work->finished();
         return;
     }
     auto worker = std::make_unique<Worker>(*this, work);

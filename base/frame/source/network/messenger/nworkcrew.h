@@ -12,12 +12,13 @@ class FWorkClass;
 
 /// Does each work on a thread of its own, as many as `kMaxThreads` at a time; further works wait until one is done.
 ///
-/// A work is ended by `finished`, which is called under the crew's lock, as `cancelWork` is: both must be short and
+/// At most `kMaxWaiting` wait; what comes on top is ended undone. A work is ended by `finished`, which is called under the crew's lock, as `cancelWork` is: both must be short and
 /// must not come back here. Thread-safe, but for `end` and the destructor, which belong to the owner.
 class NWorkCrew
 {
 public:
     static constexpr size_t kMaxThreads = 64;
+    static constexpr size_t kMaxWaiting = 4096;
 
     /// The name and the level of priority are those of the threads.
     NWorkCrew(const char* threadName, FThreadPriority threadPriority);
