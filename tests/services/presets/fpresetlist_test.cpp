@@ -49,17 +49,6 @@ bool load(const std::string& content, FAttributes& tree)
 }
 
 constexpr const char* kSample = "One=1 Two=2 Drums(Three=3 Loud(Four=4))";
-
-/// Hears of changes.
-class Listener : public CmObject
-{
-    DECLARE_TYPE(Listener, CmObject)
-
-    using CmObject::update;
-    void update(CmObject*, int message) override { messages += std::to_string(message) + " "; }
-
-    std::string messages;
-};
 } // namespace
 
 TEST(FPresetList, CountsPresetsApartFromLists)
@@ -245,12 +234,12 @@ TEST(FPresetPointer, FollowsItsPreset)
     EXPECT_FALSE(favourites.addPointerTo(*list, 1)) << "is there already";
     EXPECT_FALSE(favourites.addPointerTo(*list, 5));
     FPresetPointer& pointer = *favourites.pointerAt(0);
-    Listener listener;
+    Watched listener;
     pointer.addDependent(&listener);
     EXPECT_EQ(pointer.getPresetObject(), list->getPresetObject(1));
     list->setPresetName(1, u"Zwei");
     EXPECT_EQ(utf8(pointer.getPresetName()), "Zwei");
-    EXPECT_EQ(listener.messages, "1 ");
+    EXPECT_EQ(listener.heard, "1 ");
     EXPECT_EQ(pointer.getPresetObject(), list->getPresetObject(1));
 
     FPresetPointerList restored;

@@ -171,22 +171,3 @@ TEST_F(Pool, AFailedWriteLeavesTheEarlierFile)
     EXPECT_EQ(contentOf(kMemoryFile), whole);
     EXPECT_FALSE(exists("config/user/Presets/Presets.tmp"));
 }
-
-TEST_F(Pool, DamagedBytesNeverCrash)
-{
-    start();
-    addList<FPresetList>(u"memory", 1);
-    gPresetPool->getListAt(0)->addSubList(u"below")->addPreset(node(2), u"q");
-    PreDefSaveFPresetPool();
-    const std::string whole = contentOf(kMemoryFile);
-    for (size_t i = 0; i < whole.size(); i++)
-    {
-        std::string damaged = whole;
-        damaged[i] = "\0<9"[i % 3];
-        // A file that is emptied and written again waits for the disk.
-        std::filesystem::remove(root + "/" + kMemoryFile);
-        put(kMemoryFile, damaged);
-        start();
-        ASSERT_LE(gPresetPool->countLists(), 1);
-    }
-}

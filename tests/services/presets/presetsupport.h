@@ -7,6 +7,19 @@
 
 #include <string>
 
+/// Notes the changes of which it hears, and those of its own that are done.
+class Watched : public CmObject
+{
+    DECLARE_COPYABLE(Watched, CmObject)
+
+    using CmObject::update;
+    void update(CmObject*, int message) override { heard += std::to_string(message) + " "; }
+    void updateDone(int message) override { done += std::to_string(message) + " "; }
+
+    std::string heard;
+    std::string done;
+};
+
 /// The list's presets as "name=number", lists below it as "name(...)".
 inline std::string presetsOf(FPresetList& list)
 {

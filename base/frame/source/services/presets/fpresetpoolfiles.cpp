@@ -219,6 +219,7 @@ void PostDefLoadFPresetPool()
 void PreDefSaveFPresetPool()
 {
     const FNPath folder = getPresetFolder(FNPath::kUserFolder);
+    // Nobody is left to be told of a failure; the earlier files then stay.
     if (gPresetPool && folder.isAbsolute())
         gPresetPool->save(folder);
 }

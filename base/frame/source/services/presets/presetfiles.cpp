@@ -39,7 +39,9 @@ bool write(const FNPath& path, AddRoot addRoot, const char* rootName, CmObject* 
 FStream* open(const FNPath& path)
 {
     FNPath file(path);
-    return gFileSystem ? gFileSystem->openFile(&file, kFileRead | kFileShare, nullptr) : nullptr;
+    // A device, to which a link may lead, has no size and perhaps no end.
+    const bool hasContent = gFileSystem && gFileSystem->getFileSize(&file) > 0;
+    return hasContent ? gFileSystem->openFile(&file, kFileRead | kFileShare, nullptr) : nullptr;
 }
 } // namespace
 
