@@ -1,5 +1,6 @@
 #include "tests/network/http/httpfixture.h"
 
+#include "application/urlprotocols.h"
 #include "tests/job/process.h"
 
 #include <ostream>
@@ -29,13 +30,7 @@ std::string readAll(FStream& stream)
 
 void HttpTest::SetUpTestSuite()
 {
-    static bool isDone = false;
-    if (!isDone)
-    {
-        initFUrlHttpHandler();
-        initFUrlHttpsHandler();
-    }
-    isDone = true;
+    EXPECT_TRUE(registerUrlProtocols());
 }
 
 void HttpTest::SetUp()

@@ -50,6 +50,25 @@ protected:
 };
 } // namespace
 
+TEST_F(Transfer, IsDoneByTheHandlerOfTheProtocol)
+{
+    struct Row
+    {
+        const char16* url;
+        uint16 port;
+        const char* handler;
+    };
+    for (const Row& row :
+         {Row{u"http://h/x", 80, "FUrlHttpHandler"}, Row{u"https://h/x", 443, "FUrlHttpsHandler"},
+          Row{u"file:///x", 0, "FUrlFileHandler"}})
+    {
+        FUrl url(row.url);
+        EXPECT_EQ(url.getPort(), row.port) << row.handler;
+        ASSERT_TRUE(url.makeHandler()) << row.handler;
+        EXPECT_STREQ(url.getHandler()->isA(), row.handler);
+    }
+}
+
 TEST_F(Transfer, GetsTheBody)
 {
     struct Row

@@ -1,10 +1,8 @@
-#include "foundation/object/fvariant.h"
-#include "foundation/object/ipersistent.h"
 #include "foundation/text/cmstring.h"
-#include "services/components/fcomponentregistry.h"
 #include "storage/attribute/fnewarchive.h"
 #include "storage/attribute/fobjectlist.h"
 #include "tests/storage/objectfixture.h"
+#include "tests/storage/wordcomponent.h"
 
 #include <gtest/gtest.h>
 
@@ -33,40 +31,6 @@ class DoubtfulStream : public FMemoryStream
 
     bool verify() override { return isSound; }
     bool isSound = true;
-};
-
-const FUID kTextComponentID{0x6F0D1C52, 0x3B7E4A96, 0x8C21D5E0, 0x47FA93B8};
-
-/// A component's object, which stores a text.
-class TextComponent : public FObject, public IPersistent
-{
-public:
-    int32 queryInterface(const char* interfaceID, void** object) override
-    {
-        if (isSameInterface(interfaceID, IPersistent::iid))
-            return offerInterface<IPersistent>(this, object);
-        return FObject::queryInterface(interfaceID, object);
-    }
-    FORWARD_FUNKNOWN(FObject)
-    int32 getClassID(char* uid) override
-    {
-        kTextComponentID.toTUID(uid);
-        return kResultOk;
-    }
-    int32 saveAttributes(IAttributes* attributes) override
-    {
-        return attributes->set("t", FVariant(text.text8())) ? kResultOk : kNoInterface;
-    }
-    int32 loadAttributes(IAttributes* attributes) override
-    {
-        FVariant value;
-        attributes->get("t", value);
-        text.assign(value.getString8());
-        return kResultOk;
-    }
-    static FUnknown* make() { return static_cast<FObject*>(new TextComponent); }
-
-    FString text;
 };
 
 std::string le32(int32 value)
@@ -254,15 +218,12 @@ TEST(FNewArchive, TreesKeepEveryKindOfValue)
 
 TEST(FNewArchive, ObjectsOfComponentsKeepTheirOwnTexts)
 {
-    auto registry = adopt(new FComponentRegistry);
-    gComponentRegistry = registry;
-    registry->registerComponent(
-        new FComponentDescription("Text", kTextComponentID, "Text", &TextComponent::make));
+    const WordComponents components;
     FAttributes tree;
     for (const char* key : {"a", "b", "c"})
     {
-        auto component = adopt(new TextComponent);
-        component->text.assign(key);
+        auto component = adopt(new WordComponent);
+        component->word.assign(key);
         tree.entry(key).setUnknown(static_cast<FObject*>(component), FAttributeValue::kBorrowed);
     }
     const std::string bytes = written([&](FArchive& archive) { EXPECT_TRUE(tree.externalize(archive)); });
@@ -272,12 +233,10 @@ TEST(FNewArchive, ObjectsOfComponentsKeepTheirOwnTexts)
     EXPECT_TRUE(read.internalize(archive));
     for (const char* key : {"a", "b", "c"})
     {
-        auto* component = static_cast<TextComponent*>(toFObject(read.entry(key).getUnknown()));
+        auto* component = static_cast<WordComponent*>(toFObject(read.entry(key).getUnknown()));
         ASSERT_TRUE(component) << key;
-        EXPECT_STREQ(component->text.text8(), key) << "not that of a component whose memory was used again";
+        EXPECT_STREQ(component->word.text8(), key) << "not that of a component whose memory was used again";
     }
-    read.removeAll();
-    gComponentRegistry = nullptr;
 }
 
 TEST(FNewArchive, RefusesBorrowedTextsAndUnknownKinds)
