@@ -1,5 +1,6 @@
 #include "containers/sequence/cmlinkedlist.h"
 #include "foundation/text/cmstring.h"
+#include "storage/attribute/fattributelist.h"
 #include "storage/attribute/fsimplearchive.h"
 #include "tests/storage/objectfixture.h"
 
@@ -125,4 +126,28 @@ TEST(FSimpleArchive, LimitsTheDepth)
     const std::string whole =
         written([&](FArchive& archive) { EXPECT_TRUE(archive.writeObject(fits, true)); });
     EXPECT_TRUE(readOne(whole));
+}
+
+TEST(FAttributeList, KeepsTheLastOfEntriesThatAreReadUnderOneKey)
+{
+    const auto entry = [](const std::string& key, char value)
+    { return str8(key) + std::string("\1\0", 2) + value + std::string(7, '\0'); };
+    const std::string bytes =
+        le32(5) + entry("c", 1) + entry("a", 2) + entry("c", 3) + entry("b", 4) + entry("a", 5);
+    FStringAttributeList sorted;
+    FStringAttributeArray unsorted;
+    FSimpleArchive first(streamOf(bytes), false), second(streamOf(bytes), false);
+    ASSERT_TRUE(sorted.internalize(first) && unsorted.internalize(second));
+    const auto show = [](const auto& list)
+    {
+        std::string result;
+        for (int i = 0; i < list.total(); i++)
+            result += list.entryAt(i)->getKey() + std::to_string(list.entryAt(i)->getLong()) + ' ';
+        return result;
+    };
+    EXPECT_EQ(show(sorted), "a5 b4 c3 ");
+    EXPECT_EQ(show(unsorted), "c3 b4 a5 ");
+    FSimpleArchive cut(streamOf(bytes.substr(0, bytes.size() - 1)), false);
+    EXPECT_FALSE(sorted.internalize(cut));
+    EXPECT_EQ(show(sorted), "a2 b4 c3 ") << "what was whole stays";
 }
