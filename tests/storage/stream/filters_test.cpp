@@ -11,6 +11,7 @@
 #include <gtest/gtest.h>
 
 #include <cstdlib>
+#include <limits>
 #include <random>
 #include <unistd.h>
 
@@ -349,6 +350,34 @@ TEST(FStreamProxy, IsAWindow)
     EXPECT_EQ(bytesOf(*inner), "012abcde89");
     EXPECT_EQ(rest.seek(0, kSeekEnd), 4);
     EXPECT_EQ(rest.seek(100, kSeekStart), 100) << "an open window has no end";
+}
+
+TEST(FStream, FiltersTakePositionsAsFarAsThereAreAny)
+{
+    constexpr int64 kLast = std::numeric_limits<int64>::max();
+    auto inner = adopt(new FMemoryStream(streamOf("0123456789")));
+    FBufferedStream buffered(inner, 16, true, nullptr);
+    FStreamProxy open(inner, 4, 0, 0), window(inner, 4, kLast, 0);
+    EXPECT_EQ(buffered.seek(kLast, kSeekStart), kLast);
+    EXPECT_EQ(buffered.seek(kLast, kSeekCurrent), kLast);
+    EXPECT_EQ(buffered.seek(kLast, kSeekEnd), kLast);
+    EXPECT_EQ(writeTo(buffered, "a"), -1);
+    for (FStreamProxy* proxy : {&open, &window})
+    {
+        EXPECT_EQ(proxy->seek(kLast, kSeekStart), kLast - 4);
+        EXPECT_EQ(proxy->seek(kLast, kSeekCurrent), kLast - 4);
+        EXPECT_EQ(readFrom(*proxy, 1), "");
+        EXPECT_EQ(proxy->seek(-kLast - 1, kSeekCurrent), 0);
+        EXPECT_EQ(readFrom(*proxy, 2), "45");
+    }
+    FBlockStreamReader reader(inner, 16);
+    readFrom(reader, 3);
+    EXPECT_EQ(reader.seek(kLast, kSeekCurrent), kLast);
+    EXPECT_EQ(reader.seek(kLast, kSeekCurrent), kLast);
+    EXPECT_EQ(reader.seek(-kLast - 1, kSeekStart), -kLast - 1) << "as the stream in memory has it";
+    EXPECT_EQ(reader.seek(2, kSeekStart), 2);
+    EXPECT_EQ(readFrom(reader, 2), "23");
+    EXPECT_EQ(bytesOf(*inner), "0123456789");
 }
 
 TEST(FStreamProxy, WithoutAStreamThereIsNothing)

@@ -1,5 +1,7 @@
 #include "storage/stream/fblockstreamreader.h"
 
+#include "storage/stream/streamposition.h"
+
 #include <algorithm>
 #include <cstring>
 
@@ -80,7 +82,8 @@ int64 FBlockStreamReader::seek(int64 target, FSeekMode mode)
 {
     if (!stream || (mode != kSeekStart && mode != kSeekCurrent))
         return -1;
-    const int64 distance = mode == kSeekStart ? target - position : target;
+    const int64 wanted = mode == kSeekStart ? target : movePosition(position, target);
+    const int64 distance = distanceBetween(position, wanted);
     if (distance >= -int64{bufferOffset} && distance <= bufferBytes)
     {
         bufferOffset += static_cast<int32>(distance);
@@ -90,7 +93,7 @@ int64 FBlockStreamReader::seek(int64 target, FSeekMode mode)
     }
 
     dropBuffer();
-    const int64 result = stream->seek(position + distance, kSeekStart);
+    const int64 result = stream->seek(wanted, kSeekStart);
     position = result < 0 ? stream->tell() : result;
     return result;
 }

@@ -2,6 +2,7 @@
 
 #include "containers/value/cmbufferpool.h"
 #include "storage/stream/ffilestream.h"
+#include "storage/stream/streamposition.h"
 #include "storage/stream/uprogresshook.h"
 
 #include <algorithm>
@@ -83,10 +84,10 @@ int64 FBufferedStream::seek(int64 position, FSeekMode mode)
         target = position;
         break;
     case kSeekCurrent:
-        target = cursor + position;
+        target = movePosition(cursor, position);
         break;
     case kSeekEnd:
-        target = streamEnd + position;
+        target = movePosition(streamEnd, position);
         break;
     }
     target = std::max<int64>(target, 0);
@@ -141,6 +142,9 @@ int64 FBufferedStream::writeRaw(const void* source, int64 count)
         return -1;
     if (count <= 0)
         return 0;
+    // No stream reaches beyond the last position.
+    if (count > std::numeric_limits<int64>::max() - cursor)
+        return -1;
     if (count % blockSize() == 0 && cursor % blockSize() == 0)
         return writeAligned(source, count);
 

@@ -1,5 +1,7 @@
 #include "storage/stream/fstreamcounter.h"
 
+#include "storage/stream/streamposition.h"
+
 #include <algorithm>
 
 int64 FStreamCounter::readRaw(void*, int64)
@@ -11,7 +13,7 @@ int64 FStreamCounter::writeRaw(const void*, int64 count)
 {
     if (count < 1)
         return 0;
-    position += count;
+    position = movePosition(position, count);
     size = std::max(size, position);
     return count;
 }
@@ -24,10 +26,10 @@ int64 FStreamCounter::seek(int64 target, FSeekMode mode)
         position = target;
         break;
     case kSeekCurrent:
-        position += target;
+        position = movePosition(position, target);
         break;
     case kSeekEnd:
-        position = size - target;
+        position = distanceBetween(target, size);
         break;
     default:
         return -1;

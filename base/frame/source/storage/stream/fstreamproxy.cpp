@@ -1,5 +1,7 @@
 #include "storage/stream/fstreamproxy.h"
 
+#include "storage/stream/streamposition.h"
+
 #include <algorithm>
 
 FStreamProxy::FStreamProxy(FStream* innerStream, int64 firstByte, int64 byteCount, int accessMode)
@@ -15,9 +17,14 @@ FStreamProxy::FStreamProxy(FStream* innerStream, int64 firstByte, int64 byteCoun
     byteOrder = stream->getByteOrder();
 }
 
+int64 FStreamProxy::end() const
+{
+    return movePosition(start, length);
+}
+
 int64 FStreamProxy::clip(int64 count) const
 {
-    return length > 0 ? std::min(count, start + length - position) : count;
+    return length > 0 ? std::min(count, distanceBetween(position, end())) : count;
 }
 
 int64 FStreamProxy::readRaw(void* target, int64 count)
@@ -60,21 +67,21 @@ int64 FStreamProxy::seek(int64 target, FSeekMode seekMode)
         base = position;
         break;
     case kSeekEnd:
-        base = length > 0 ? start + length : stream->seek(0, kSeekEnd);
+        base = length > 0 ? end() : stream->seek(0, kSeekEnd);
         break;
     default:
         offset = 0;
         break;
     }
-    position = std::max(base + offset, start);
+    position = std::max(movePosition(base, offset), start);
     if (length > 0)
-        position = std::min(position, start + length);
+        position = std::min(position, end());
     return tell();
 }
 
 int64 FStreamProxy::tell()
 {
-    return stream ? position - start : -1;
+    return stream ? distanceBetween(start, position) : -1;
 }
 
 void FStreamProxy::flush()

@@ -38,6 +38,8 @@ protected:
 private:
     /// How many of `count` bytes lie inside the window; below 0 behind its end.
     int64 clip(int64 count) const;
+    /// Behind the last byte of a window that has a length.
+    int64 end() const;
 
     int mode;
 };
