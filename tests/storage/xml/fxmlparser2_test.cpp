@@ -178,6 +178,40 @@ TEST(FXmlParser2, RefusesWhatWouldTakeTooMuch)
     EXPECT_TRUE(third.process(&notTooDeep));
 }
 
+TEST(FXmlParser2, RefusesADocumentOfNothingButNewNames)
+{
+    // A run of distinct names that the library would have to keep, whatever the handler does.
+    std::string names = "<r>";
+    for (int i = 0; i < 1500000; i++)
+        names += "<n" + std::to_string(i) + "/>";
+    TextStream stream(names + "</r>");
+    FXmlParser2 parser;
+    EXPECT_FALSE(parser.process(&stream));
+    EXPECT_EQ(errorOf(parser).substr(0, 24), "Xml Error: out of memory");
+
+    EXPECT_TRUE(parser.reset(nullptr)) << "what was kept is given back";
+    TextStream small("<r><a/></r>");
+    EXPECT_TRUE(parser.process(&small));
+}
+
+TEST(FXmlParser2, RefusesDeclarationsThatBlowItUp)
+{
+    std::string text = "<!DOCTYPE r [";
+    for (int i = 0; i < 1000; i++)
+        text += "<!ATTLIST a a" + std::to_string(i) + " CDATA 'x'>";
+    text += "]><r><a/>";
+    TextStream few(text + "</r>");
+    RecordingHandler handler;
+    FXmlParser2 first(&handler);
+    EXPECT_TRUE(first.process(&few));
+    EXPECT_NE(handler.record.find("a999='x'"), std::string::npos);
+
+    TextStream many(text + repeated("<a/>", 1000) + "</r>");
+    FXmlParser2 second;
+    EXPECT_FALSE(second.process(&many));
+    EXPECT_EQ(errorOf(second), "Xml Error: parsing aborted \r\nLine: 0");
+}
+
 TEST(FXmlParser2, SurvivesAnEntityBomb)
 {
     std::string text = "<!DOCTYPE a [<!ENTITY x0 'ha'>";

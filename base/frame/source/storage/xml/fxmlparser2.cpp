@@ -4,6 +4,7 @@
 #include "storage/stream/ibstream.h"
 
 #include <cstdio>
+#include <cstring>
 #include <expat.h>
 
 DEFINE_INTERFACE_ID(INewXmlParser, 0x2C8F05B7, 0x4E714A1D, 0x9D36F0A8, 0x51C2E74B)
@@ -24,7 +25,8 @@ struct FXmlParser2::Callbacks
     {
         FXmlParser2& self = parserOf(userData);
         self.begun = true;
-        if (++self.depth > kMaxDepth)
+        self.countAdded(attributes);
+        if (++self.depth > kMaxDepth || self.bytesAdded > kMaxAddedBytes)
             return self.stop();
         if (self.handler)
             self.handler->startTag(&self, name, attributes);
@@ -51,7 +53,7 @@ struct FXmlParser2::Callbacks
 };
 
 FXmlParser2::FXmlParser2(INewXmlHandler* newHandler, const char* encoding)
-    : parser(XML_ParserCreate(encoding)),
+    : parser(makeParser(encoding)),
       handler(newHandler)
 {
     install();
@@ -68,6 +70,14 @@ int32 FXmlParser2::queryInterface(const char* interfaceID, void** object)
     if (isSameInterface(interfaceID, INewXmlParser::iid))
         return offerInterface<INewXmlParser>(this, object);
     return FObject::queryInterface(interfaceID, object);
+}
+
+XML_ParserStruct* FXmlParser2::makeParser(const char* encoding)
+{
+    static constexpr XML_Memory_Handling_Suite functions = {
+        &XmlParserMemory::allocate, &XmlParserMemory::resize, &XmlParserMemory::release};
+    const XmlParserMemory::Scope scope(memory);
+    return XML_ParserCreate_MM(encoding, &functions, nullptr);
 }
 
 void FXmlParser2::install()
@@ -91,6 +101,7 @@ bool FXmlParser2::process(IBStream* stream)
         return false;
     if (documentStart < 0 && (stream->tell(&documentStart) != kResultOk || documentStart < 0))
         documentStart = 0;
+    const XmlParserMemory::Scope scope(memory);
     Outcome outcome = Outcome::kMore;
     while (outcome == Outcome::kMore)
         outcome = parseBlock(*stream);
@@ -137,6 +148,14 @@ bool FXmlParser2::isTooLong()
     return bytesFed - tokenStart > kMaxTokenBytes || (!begun && bytesFed > kMaxPrologBytes);
 }
 
+// Attributes that an element doesn't have itself but by declaration stand behind its own.
+void FXmlParser2::countAdded(const char** attributes)
+{
+    constexpr size_t kEachCosts = 64;
+    for (const char** added = attributes + XML_GetSpecifiedAttributeCount(parser); *added; added += 2)
+        bytesAdded += static_cast<int64>(strlen(added[0]) + strlen(added[1]) + kEachCosts);
+}
+
 void FXmlParser2::stop()
 {
     if (parser)
@@ -153,6 +172,7 @@ bool FXmlParser2::resume(IBStream* stream)
 {
     if (!parser || !stream || refused)
         return false;
+    const XmlParserMemory::Scope scope(memory);
     const Outcome outcome = judge(XML_ResumeParser(parser), *stream);
     if (outcome != Outcome::kMore)
         return outcome == Outcome::kDone;
@@ -163,11 +183,13 @@ bool FXmlParser2::resume(IBStream* stream)
 
 bool FXmlParser2::reset(const char* encoding)
 {
+    const XmlParserMemory::Scope scope(memory);
     if (!parser || !XML_ParserReset(parser, encoding))
         return false;
     install();
     documentStart = -1;
     bytesFed = 0;
+    bytesAdded = 0;
     tokenStart = 0;
     depth = 0;
     begun = false;
@@ -177,6 +199,7 @@ bool FXmlParser2::reset(const char* encoding)
 
 bool FXmlParser2::setEncoding(const char* encoding)
 {
+    const XmlParserMemory::Scope scope(memory);
     return parser && XML_SetEncoding(parser, encoding) == XML_STATUS_OK;
 }
 

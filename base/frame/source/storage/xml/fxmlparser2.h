@@ -4,6 +4,7 @@
 #include "foundation/object/iptr.h"
 #include "storage/xml/inewxmlhandler.h"
 #include "storage/xml/inewxmlparser.h"
+#include "storage/xml/xmlparsermemory.h"
 
 struct XML_ParserStruct;
 
@@ -11,7 +12,9 @@ struct XML_ParserStruct;
 ///
 /// Refused, like a document that a handler stopped, is one that is nested deeper than `kMaxDepth`, that has more than
 /// `kMaxPrologBytes` of declarations in front of its root, or one tag, comment or the like longer than
-/// `kMaxTokenBytes`: no input may take memory or time out of all proportion. One thread at a time.
+/// `kMaxTokenBytes`: no input may take memory or time out of all proportion. One whose names take more than
+/// `kMaxKeptBytes` ends with the error that memory ran out. Declarations add no more than `kMaxAddedBytes` of attributes to
+/// the elements, and entities can't blow a document up to many times its size. One thread at a time.
 class FXmlParser2 : public FObject, public INewXmlParser
 {
     DECLARE_TYPE(FXmlParser2, FObject)
@@ -37,6 +40,8 @@ class FXmlParser2 : public FObject, public INewXmlParser
     static constexpr int kMaxDepth = 5000;
     static constexpr int64 kMaxTokenBytes = 1 << 20;
     static constexpr int64 kMaxPrologBytes = 1 << 20;
+    static constexpr size_t kMaxKeptBytes = 64 << 20;
+    static constexpr int64 kMaxAddedBytes = 4 << 20;
 
 private:
     struct Callbacks;
@@ -48,18 +53,22 @@ private:
         kFailed
     };
 
+    XML_ParserStruct* makeParser(const char* encoding);
     void install();
     Outcome parseBlock(IBStream& stream);
     Outcome judge(int status, IBStream& stream);
     bool isTooLong();
+    void countAdded(const char** attributes);
     int errorCode() const;
 
+    XmlParserMemory memory{kMaxKeptBytes};
     XML_ParserStruct* parser;
     IPtr<INewXmlHandler> handler;
     /// Where in the stream the document begins; -1 before it has begun.
     int64 documentStart = -1;
     int64 bytesFed = 0;
     int64 tokenStart = 0;
+    int64 bytesAdded = 0;
     int depth = 0;
     /// Whether the root has begun.
     bool begun = false;
