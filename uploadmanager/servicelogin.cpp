@@ -27,19 +27,31 @@
 
 namespace
 {
-// A query pair and the fragment behind it come apart at "#". The element that moves up into the place of a split one
+// The service sends a handful. Each pair is compared with all before it, so that a page that sends the user here must not
+// choose their number.
+constexpr int kMaxPairs = 1000;
+
+// A query pair and the fragment behind it come apart at "#", and go to the end. What stands right behind a split one
 // is not looked at: the service sends one fragment at most.
 void splitFragments(CmArray& parts)
 {
+    CmArray whole(0, 10);
+    whole.retainElements();
     for (int i = 0; i < parts.total(); i++)
     {
         CmArray pieces(0, 10);
         CmString* part = static_cast<CmString*>(parts.at(i));
         if (CmString::split(*part, pieces, u"#", false, true) != 2)
+        {
+            whole.add(part);
             continue;
+        }
         parts.takeAllFrom(&pieces, true);
-        parts.removeAt(i);
+        if (++i < parts.total())
+            whole.add(parts.at(i));
     }
+    parts.removeAll();
+    parts.takeAllFrom(&whole, true);
 }
 
 bool addPair(CmString& part, CmDictionary& result)
@@ -128,6 +140,9 @@ bool PUploadManagerApplication::parseUrl(FPath* url, CmDictionary& result)
         return true;
     String query;
     if (!text.extract(query, static_cast<unsigned>(question) + 1, -1))
+        return false;
+
+    if (query.countOccurences(u'&') + query.countOccurences(u'#') >= kMaxPairs)
         return false;
 
     CmArray parts(0, 10);

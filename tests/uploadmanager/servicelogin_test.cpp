@@ -63,6 +63,20 @@ TEST_F(ServiceLogin, TakesQueryAndFragmentApart)
         << "the part that moves up behind a split one is not looked at";
 }
 
+TEST_F(ServiceLogin, RefusesMorePairsThanAServiceWouldSend)
+{
+    std::string url = "vlmr://plenar/x?a=1";
+    for (int i = 1; i < 1000; i++)
+        url += "&k" + std::to_string(i) + "=v";
+    Values values;
+    EXPECT_TRUE(parse(url.c_str(), values));
+    EXPECT_EQ(values, (Values{{"a", "1"}}));
+
+    values.clear();
+    EXPECT_FALSE(parse((url + "#k=v").c_str(), values));
+    EXPECT_TRUE(values.empty());
+}
+
 TEST_F(ServiceLogin, StoresTheTokenOfTheProductThatTheUrlNames)
 {
     EXPECT_TRUE(redirect("vlmr://zentor/successfullLogin?code=1#access_token=1-2-secret"));
