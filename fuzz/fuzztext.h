@@ -19,6 +19,8 @@ public:
         return *next++;
     }
 
+    bool isEmpty() const { return left == 0; }
+
     /// A 16-bit text of at most `limit` characters; bytes stand for characters, FF for two further bytes of one.
     std::u16string takeText(size_t limit)
     {
