@@ -139,6 +139,16 @@ TEST(NetMessageForm, LimitsTheObjects)
     EXPECT_FALSE(readFrom(bytesOf(message)));
     EXPECT_FALSE(bytesForNetwork("inbox", message)) << "nobody would take it";
 
+    const auto one = adopt(new CmString("x"));
+    const auto references = adopt(new CmLinkedList);
+    references->retainElements();
+    message.add("list", references, true);
+    for (int i = 1; i < kMaxNetMessageObjects; i++)
+        references->add(one);
+    EXPECT_TRUE(readFrom(bytesOf(message)));
+    references->add(one);
+    EXPECT_FALSE(readFrom(bytesOf(message))) << "a reference is short, but no less work";
+
     FMessage large("m");
     const std::string text(static_cast<size_t>(kMaxNetMessage), 'x');
     large.addString8("text", text.c_str());

@@ -11,7 +11,7 @@ class FString;
 
 /// The most bytes that a message may have.
 inline constexpr int64 kMaxNetMessage = 16 * 1024 * 1024;
-/// The most objects that it may have.
+/// The most objects that it may have, references to them counted in.
 inline constexpr int kMaxNetMessageObjects = 65536;
 
 /// False where a value of the message can't be sent.

@@ -92,6 +92,9 @@ void NMessageRecvThread::collectMessages()
 /// Whether the connection can go.
 bool NMessageRecvThread::isDone(NMessageStream& connection)
 {
+    // Reading what came takes its time, and nobody waits for it any more.
+    if (server.isStopped())
+        return true;
     const NMessageStream::Progress progress = connection.collect();
     if (progress == NMessageStream::kGoesOn)
         return connection.isStalled(stallLimit);

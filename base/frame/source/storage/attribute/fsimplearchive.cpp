@@ -87,11 +87,12 @@ CmObject* FSimpleArchive::readObject(const char* className, bool shared)
 
 CmObject* FSimpleArchive::findRead(uint32 number, const char* className)
 {
-    if (number > entries.size() || !entries[number - 1].isWhole)
+    if (number > entries.size() || !entries[number - 1].isWhole || isFull())
         return refuse();
     CmObject* object = entries[number - 1].object;
     if (className && !object->isTypeOf(className, true))
         return refuse();
+    references++;
     object->addRef();
     return object;
 }
@@ -99,7 +100,7 @@ CmObject* FSimpleArchive::findRead(uint32 number, const char* className)
 CmObject* FSimpleArchive::readBody(MetaClass* meta, const char* className, bool shared)
 {
     IPtr<CmObject> object = createStoredObject(meta, className);
-    if (!object || objects.size() >= objectLimit)
+    if (!object || isFull())
         return refuse();
     objects.push_back(object);
     const size_t index = entries.size();

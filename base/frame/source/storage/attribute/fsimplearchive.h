@@ -33,7 +33,8 @@ public:
     MetaClass* readClass(int32 tag);
     bool writeClass(MetaClass* meta);
 
-    /// While reading, a further object is an error. Without a limit at first.
+    /// While reading, a further object or reference to one is an error: references are short, and a list of millions
+    /// of them may take its time. Without a limit at first.
     void setObjectLimit(int limit) { objectLimit = static_cast<size_t>(limit); }
     /// All objects that were read, or whose reading failed, in the order in which they began.
     const std::vector<IPtr<CmObject>>& getObjects() const { return objects; }
@@ -56,6 +57,7 @@ private:
     CmObject* findRead(uint32 number, const char* className);
     CmObject* refuse();
     bool refuseToWrite();
+    bool isFull() const { return objects.size() + references >= objectLimit; }
 
     int depth = 0;
     // Writing: the numbers given, and the objects whose body is under way.
@@ -65,5 +67,6 @@ private:
     std::vector<Entry> entries;
     std::vector<IPtr<CmObject>> objects;
     std::vector<StoredClass> classes;
+    size_t references = 0;
     size_t objectLimit = SIZE_MAX;
 };
