@@ -32,7 +32,12 @@ bool FUrlTlsStream::encrypt(const FString& host)
 bool FUrlTlsStream::close()
 {
     if (session)
+    {
+        // The goodbye must not wait for a server that reads nothing: no cancel reaches a stream that is being closed.
+        socket->setNonBlockingMode(true);
         session->end();
+        socket->setNonBlockingMode(false);
+    }
     session.reset();
     return FUrlStream::close();
 }
