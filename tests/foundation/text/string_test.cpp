@@ -56,6 +56,8 @@ TEST(String, OnlyGrowsWideByMixing)
     EXPECT_EQ(shape(String("a").append(u'b', 3)), "wide:abbb");
     EXPECT_EQ(shape(String("ab").append("cdef", 2)), "narrow:abcd");
     EXPECT_EQ(shape(String("ab").append(static_cast<const char*>(nullptr))), "narrow:ab");
+    String own("abc");
+    EXPECT_EQ(shape(own.append(own.text8() + 1).append(own.text8() + 3, 1)), "narrow:abcbcb");
 }
 
 TEST(String, InsertsAndReplaces)

@@ -1,5 +1,6 @@
 #include "platform/icu/textservices.h"
 
+#include "foundation/text/charwidth.h"
 #include "foundation/text/utf8.h"
 #include "platform/icu/codepage.h"
 
@@ -105,7 +106,8 @@ char* IcuTextServices::toMultiByte(const char16* text, unsigned length, unsigned
                                    unsigned& resultLength)
 {
     const bool isUtf8 = encoding == kEncodingUtf8;
-    const std::size_t capacity = std::size_t{length} * (isUtf8 ? 3 : 2);
+    const std::size_t most = isAsciiText(text, length) ? 1 : isUtf8 ? 3 : 2;
+    const std::size_t capacity = length * most;
     auto* result = allocate<char>(capacity);
     if (!result)
         return nullptr;

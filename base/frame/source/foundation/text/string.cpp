@@ -172,6 +172,15 @@ void String::take(void* text, bool wide)
     updateLength();
 }
 
+void String::take(void* text, bool wide, unsigned newLength)
+{
+    if (text != buffer)
+        std::free(buffer);
+    buffer = text;
+    isWide = wide;
+    len = newLength & kMaxTextLength;
+}
+
 void String::take(String& other)
 {
     if (this == &other)
@@ -207,10 +216,18 @@ bool String::toWideString(unsigned encoding)
         return true;
     if (isEmpty())
         return resize(0, true);
+    // The text ends at the first zero, where there is one before its length.
+    return takeWide(chars8(), measureText(chars8(), len), encoding);
+}
+
+bool String::takeWide(const char* text, unsigned length, unsigned encoding)
+{
+    if (length > kMaxTextLength)
+        return false;
     unsigned newLength = 0;
-    char16* wide = ITextServices::instance().toWide(chars8(), len, encoding, u' ', newLength);
+    char16* wide = ITextServices::instance().toWide(text, length, encoding, u' ', newLength);
     if (wide)
-        take(wide, true);
+        take(wide, true, newLength);
     return wide != nullptr;
 }
 
@@ -239,8 +256,8 @@ bool String::recode(unsigned encoding)
 
 bool String::fromUTF8(const char* text)
 {
-    assign(text);
-    return toWideString(kEncodingUtf8);
+    const unsigned newLength = measureText(text);
+    return newLength == 0 ? resize(0, true) : takeWide(text, newLength, kEncodingUtf8);
 }
 
 bool String::normalize(UnicodeNormalization form)

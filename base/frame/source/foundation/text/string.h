@@ -126,6 +126,8 @@ public:
     bool fromAttributes(IAttributes* attributes, const char* id);
     /// Adopts a `malloc`ed, terminated text.
     void take(void* text, bool wide);
+    /// The same where the length is known.
+    void take(void* text, bool wide, unsigned newLength);
     void take(String& other);
     /// Gives up the characters: the caller frees them with `free`. May be null.
     void* pass();
@@ -149,6 +151,8 @@ private:
 
     /// Brings a narrow text from the default encoding into another one.
     bool recode(unsigned encoding);
+    /// Takes the wide form of bytes that may be those of this text.
+    bool takeWide(const char* text, unsigned length, unsigned encoding);
     bool owns(const void* text) const;
     void terminate(unsigned index);
     void fillWith(char character, unsigned index, unsigned count);
@@ -162,6 +166,10 @@ private:
     String& assignRun(Char character, int count);
     template <class Char>
     String& appendRun(Char character, int count);
+    template <class Char>
+    String& appendText(const Char* text, unsigned count);
+    template <class Char>
+    Char* extend(unsigned count);
     template <class Char>
     String& splice(unsigned index, unsigned removed, const Char* text, unsigned count);
     template <class Char>

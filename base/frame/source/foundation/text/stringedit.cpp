@@ -84,11 +84,12 @@ String& String::assignText(const Char* text, int count, bool isTerminated)
         return *this;
     }
     const unsigned newLength = countedLength(text, count);
-    if (!resize(newLength, kIsWide<Char>) || newLength == 0)
+    const bool fits = newLength > 0 && newLength == len && isWide == kIsWide<Char>;
+    if (!fits && (!resize(newLength, kIsWide<Char>) || newLength == 0))
         return *this;
     std::memcpy(buffer, text, newLength * sizeof(Char));
     len = newLength & kMaxTextLength;
-    terminate(newLength);
+    chars<Char>()[newLength] = 0;
     return *this;
 }
 
@@ -109,14 +110,40 @@ String& String::appendRun(Char character, int count)
 {
     if (character == 0 || count <= 0)
         return *this;
-    const unsigned oldLength = len;
-    const unsigned newLength = oldLength + static_cast<unsigned>(count);
-    if (!resize(newLength, isWide))
-        return *this;
-    std::fill_n(chars<Char>() + oldLength, count, character);
-    len = newLength & kMaxTextLength;
-    terminate(newLength);
+    if (Char* place = extend<Char>(static_cast<unsigned>(count)))
+        for (int i = 0; i < count; ++i)
+            place[i] = character;
     return *this;
+}
+
+template <class Char>
+String& String::appendText(const Char* text, unsigned count)
+{
+    // A text that is part of this one moves with it.
+    const bool isOwn = owns(text);
+    const std::size_t offset = isOwn ? static_cast<std::size_t>(text - chars<Char>()) : 0;
+    if (count == 0)
+        return *this;
+    if (Char* place = extend<Char>(count))
+        std::memcpy(place, isOwn ? chars<Char>() + offset : text, count * sizeof(Char));
+    return *this;
+}
+
+/// Lets the text, which has this width, be longer by as many characters; gives the place of the first of them.
+template <class Char>
+Char* String::extend(unsigned count)
+{
+    const std::size_t newLength = std::size_t{len} + count;
+    if (newLength > kMaxTextLength)
+        return nullptr;
+    void* longer = std::realloc(buffer, (newLength + 1) * sizeof(Char));
+    if (!longer)
+        return nullptr;
+    buffer = longer;
+    Char* place = chars<Char>() + len;
+    place[count] = 0;
+    len = static_cast<unsigned>(newLength) & kMaxTextLength;
+    return place;
 }
 
 template <class Char>
@@ -287,7 +314,7 @@ String& String::append(char16 character, int count)
 {
     if (isEmpty())
         return assign(character, count);
-    return toWideString() ? appendRun(character, count) : *this;
+    return isWide || toWideString() ? appendRun(character, count) : *this;
 }
 
 String& String::insertAt(unsigned index, const char* text, int count)
@@ -311,6 +338,8 @@ String& String::insertAt(unsigned index, const char* text, int count, bool isTer
         return text ? assign(text, count, isTerminated) : *this;
     if (!text || index > len)
         return *this;
+    if (!isWide && index == len)
+        return appendText(text, countedLength(text, count));
     if (!isWide)
         return splice(index, 0, text, countedLength(text, count));
     String wide(text, count);
@@ -323,8 +352,10 @@ String& String::insertAt(unsigned index, const char16* text, int count, bool isT
 {
     if (isEmpty())
         return text ? assign(text, count, isTerminated) : *this;
-    if (!text || index > len || !toWideString())
+    if (!text || index > len || !(isWide || toWideString()))
         return *this;
+    if (index == len)
+        return appendText(text, countedLength(text, count));
     return splice(index, 0, text, countedLength(text, count));
 }
 

@@ -2,6 +2,9 @@
 
 #include "foundation/text/charwidth.h"
 
+#include <bit>
+#include <cstring>
+
 namespace
 {
 constexpr unsigned kBlock = 16;
@@ -73,30 +76,49 @@ bool takeCharacter(const Byte*& in, const Byte* end, char16*& out)
     return lead < 0xF5 && takeFour(in, end, out);
 }
 
-/// Whole blocks let the compiler use wide registers.
+/// How many of the first `kBlock` characters stand before one above 127: eight bytes are looked at together.
 template <class Element>
-bool isAsciiBlock(const Element* text)
+unsigned countAscii(const Element* text)
 {
-    unsigned bits = 0;
-    for (unsigned i = 0; i < kBlock; ++i)
-        bits |= text[i];
-    return bits < 0x80;
+    constexpr uint64 kAbove = sizeof(Element) == 1 ? 0x8080808080808080 : 0xFF80FF80FF80FF80;
+    constexpr unsigned kTogether = sizeof(uint64) / sizeof(Element);
+    constexpr unsigned kBitsPerElement = 8 * sizeof(Element);
+    for (unsigned i = 0; i < kBlock; i += kTogether)
+    {
+        uint64 word = 0;
+        memcpy(&word, text + i, sizeof(word));
+        word &= kAbove;
+        if (word == 0)
+            continue;
+        const int bits =
+            std::endian::native == std::endian::little ? std::countr_zero(word) : std::countl_zero(word);
+        return i + static_cast<unsigned>(bits) / kBitsPerElement;
+    }
+    return kBlock;
 }
 
-/// Copies the characters below 128 at both places and steps behind them. Most runs between other characters are
-/// short: only a run that has shown some length is worth a look at blocks.
+/// Copies the characters below 128 at both places and steps behind them. A block is written whole, and then what
+/// follows writes over what was none of them: there is room, since no character gives less than one element.
 template <class From, class To>
 void copyAscii(const From*& in, const From* end, To*& out)
 {
-    for (unsigned i = 0; i < kBlock; ++i)
+    while (end - in >= kBlock)
     {
-        if (in == end || *in >= 0x80)
-            return;
-        *out++ = static_cast<To>(*in++);
-    }
-    for (; end - in >= kBlock && isAsciiBlock(in); in += kBlock, out += kBlock)
+        // In places of their own the elements go through wide registers.
+        From from[kBlock];
+        To to[kBlock];
+        memcpy(from, in, sizeof(from));
         for (unsigned i = 0; i < kBlock; ++i)
-            out[i] = static_cast<To>(in[i]);
+            to[i] = static_cast<To>(from[i]);
+        memcpy(out, to, sizeof(to));
+        const unsigned count = countAscii(in);
+        in += count;
+        out += count;
+        if (count < kBlock)
+            return;
+    }
+    while (in < end && *in < 0x80)
+        *out++ = static_cast<To>(*in++);
 }
 
 /// Writes the character above 127 at `in` and steps behind it.
