@@ -237,6 +237,27 @@ TEST(StringHash, MultipliesBy64WithTheCharactersSign)
     EXPECT_EQ(hashString16(u"", 50), 0u);
 }
 
+TEST(StringHash, TakesTheRemainderBehindEveryCharacter)
+{
+    const auto byTheRule = [](const std::string& text, unsigned size)
+    {
+        unsigned hash = 0;
+        for (const char c : text)
+            hash = ((hash << 6) + static_cast<unsigned>(static_cast<signed char>(c))) % size;
+        return hash;
+    };
+    for (const char* text : {"a longer name of forty characters or so", "\x7F\x7F\x7F\x7F\x7F\x7F\x7F\x7F",
+                             "Gr\xC3\xB6\xC3\x9F"
+                             "e \xFF\xFF",
+                             "\x80", "1234567"})
+        for (const unsigned size : {1u, 2u, 50u, 1021u, 1u << 25, (1u << 25) + 1, 0xFFFFFFFFu})
+            EXPECT_EQ(hashString8(text, size), byTheRule(text, size)) << text << " of " << size;
+    unsigned hash = 0;
+    for (int i = 0; i < 9; i++)
+        hash = ((hash << 6) + 0xFFFFu) % (1u << 25);
+    EXPECT_EQ(hashString16(std::u16string(9, u'\xFFFF').c_str(), 1u << 25), hash);
+}
+
 TEST(CmDelegatingUnknown, AnswersForItsDelegate)
 {
     auto* component = new Component;
