@@ -1,5 +1,6 @@
 #include "foundation/object/blockpool.h"
 
+#include <algorithm>
 #include <cstdlib>
 #include <mutex>
 #include <utility>
@@ -28,7 +29,8 @@ void BlockPool::giveBack(void* block, std::size_t) noexcept
 
 namespace
 {
-constexpr std::size_t kStep = alignof(std::max_align_t);
+/// Blocks whose size is a multiple of 16 are aligned to it; a type that needs that has such a size.
+constexpr std::size_t kStep = 8;
 constexpr std::size_t kSizes = BlockPool::kLargest / kStep;
 /// The blocks that are made, and that go to the store, at a time.
 constexpr unsigned kBatch = 64;
@@ -39,7 +41,6 @@ struct FreeBlock
     FreeBlock* next;
     FreeBlock* nextBatch;
 };
-static_assert(sizeof(FreeBlock) <= kStep);
 
 /// The free blocks of one size that no thread has at hand, in batches.
 class Store
@@ -106,16 +107,15 @@ ThreadEnd::~ThreadEnd()
 
 std::size_t indexOf(std::size_t size)
 {
-    return size == 0 ? 0 : (size - 1) / kStep;
+    return (std::max(size, sizeof(FreeBlock)) - 1) / kStep;
 }
 
 FreeBlock* makeBatch(std::size_t blockSize)
 {
+    // The list is linked as the blocks lie, so that objects made one after the other lie side by side.
     auto* bytes = static_cast<char*>(std::malloc(kBatch * blockSize));
-    if (!bytes)
-        return nullptr;
     FreeBlock* first = nullptr;
-    for (unsigned i = kBatch; i > 0; i--)
+    for (unsigned i = bytes ? kBatch : 0; i > 0; i--)
         first = new (bytes + (i - 1) * blockSize) FreeBlock{first, nullptr};
     return first;
 }

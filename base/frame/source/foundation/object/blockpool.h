@@ -14,7 +14,7 @@ namespace BlockPool
 {
 inline constexpr std::size_t kLargest = 256;
 
-/// Aligned for every type; null where there is no memory.
+/// Aligned for every type of this size; null where there is no memory.
 [[nodiscard]] void* take(std::size_t size) noexcept;
 /// `size` is that which the block was taken with. Null is legal.
 void giveBack(void* block, std::size_t size) noexcept;

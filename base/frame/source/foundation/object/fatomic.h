@@ -4,6 +4,11 @@
 
 // The framework's only atomic primitives; all of them act with full barriers.
 
+inline int FAtomicRead(const volatile int& value)
+{
+    return std::atomic_ref<int>(const_cast<int&>(value)).load(std::memory_order_seq_cst);
+}
+
 /// Adds `delta`; gives the value before.
 inline int FAtomicAdd(volatile int& value, int delta)
 {

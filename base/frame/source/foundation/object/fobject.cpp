@@ -38,8 +38,9 @@ uint32 FObject::addRef()
 
 uint32 FObject::release()
 {
-    // The member must not be read after the decrement: another thread may have deleted the object by then.
-    const int before = FAtomicDecrement(refCount);
+    // A single reference is the caller's, so that no other thread can add or release one: nothing is left to count.
+    // Otherwise the member must not be read after the decrement: another thread may have deleted the object by then.
+    const int before = FAtomicRead(refCount) == 1 ? 1 : FAtomicDecrement(refCount);
     if (before != 1)
         return static_cast<uint32>(before - 1);
     refCount = kDying;
@@ -49,7 +50,7 @@ uint32 FObject::release()
 
 uint32 FObject::getRefCount() const
 {
-    return static_cast<uint32>(FAtomicAdd(refCount, 0));
+    return static_cast<uint32>(FAtomicRead(refCount));
 }
 
 void FObject::update(FUnknown*, int) {}
