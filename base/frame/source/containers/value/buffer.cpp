@@ -110,19 +110,6 @@ bool Buffer::reserve(uint64 size)
     return rounded <= std::numeric_limits<uint32>::max() && setSize(static_cast<uint32>(rounded));
 }
 
-bool Buffer::grow(uint32 size)
-{
-    return reserve(size);
-}
-
-bool Buffer::setFillSize(uint32 size)
-{
-    if (!reserve(size))
-        return false;
-    fillSize = size;
-    return true;
-}
-
 bool Buffer::operator==(const Buffer& other) const
 {
     return memSize == other.memSize && (memSize == 0 || memcmp(buffer, other.buffer, memSize) == 0);

@@ -30,9 +30,15 @@ public:
     /// empty afterwards.
     bool setSize(uint32 size);
     /// Makes the block hold at least `size` bytes.
-    bool grow(uint32 size);
+    bool grow(uint32 size) { return size <= memSize || reserve(size); }
     /// Grows where needed.
-    bool setFillSize(uint32 size);
+    bool setFillSize(uint32 size)
+    {
+        if (!grow(size))
+            return false;
+        fillSize = size;
+        return true;
+    }
     bool truncateToFillSize() { return setSize(fillSize); }
     void setDelta(uint32 step) { delta = step; }
     void flush() { fillSize = 0; }
@@ -48,7 +54,13 @@ public:
     bool put(const void* data, uint32 count);
     /// The characters in the string's width, with their terminator.
     bool put(const String& text);
-    bool put(char character) { return put(&character, sizeof(character)); }
+    bool put(char character)
+    {
+        if (fillSize >= memSize)
+            return put(&character, sizeof(character));
+        buffer[fillSize++] = character;
+        return true;
+    }
     bool put(uint8 byte) { return put(&byte, sizeof(byte)); }
     bool put(char16 character) { return put(&character, sizeof(character)); }
     bool put(uint16 value) { return put(&value, sizeof(value)); }

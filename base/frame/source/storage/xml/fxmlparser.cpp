@@ -8,6 +8,8 @@
 #include "storage/xml/xmltext.h"
 
 #include <algorithm>
+#include <array>
+#include <string_view>
 
 namespace
 {
@@ -19,6 +21,27 @@ constexpr const char* kErrorMessages[] = {"",
                                           "Unexpected end of file!",
                                           "Not enough actual attributes in tag!",
                                           "Unexpected Tag!"};
+
+using ByteSet = std::array<bool, 256>;
+
+constexpr ByteSet makeSet(std::string_view bytes)
+{
+    ByteSet set{};
+    for (const char c : bytes)
+        set[static_cast<uint8>(c)] = true;
+    return set;
+}
+
+/// The bytes that end a name, or may mean something else than themselves in a value.
+constexpr ByteSet kNameEnds = makeSet({"\0\t\n\r \"&'/<=>?\\", 14});
+constexpr ByteSet kValueEnds = makeSet({"\0\n\r\"&'\\", 7});
+
+const char* findByte(const char* begin, const char* limit, const ByteSet& set)
+{
+    while (begin < limit && !set[static_cast<uint8>(*begin)])
+        begin++;
+    return begin;
+}
 
 bool isTextEqual(const FString& text, const char* other)
 {
@@ -118,6 +141,7 @@ bool FXmlParser::skip()
 bool FXmlParser::processToken(int startDepth, void* data)
 {
     long long size = 0;
+    skipLayout();
     switch (getNextToken(tokenBuffer.ptr(), &size, false))
     {
     case kEndOfData:
@@ -183,6 +207,12 @@ bool FXmlParser::readAttributes(CmArray& attributes, Token& ending)
     while (true)
     {
         long long size = 0;
+        skipBlanks();
+        if (FXmlAttribute* plain = takePlainAttribute())
+        {
+            attributes.add(plain);
+            continue;
+        }
         ending = getNextToken(tokenBuffer.ptr(), &size, true);
         if (ending == kLineEnd || ending == kSpace)
             continue;
@@ -237,6 +267,33 @@ void FXmlParser::handlePI()
     recycle(attributes);
 }
 
+/// Most attributes lie whole in the buffer and hold nothing that means something else: name="value". They are taken
+/// from where they lie. Null, with nothing read, for any other, which then goes the way of all tokens.
+FXmlAttribute* FXmlParser::takePlainAttribute()
+{
+    const char* const name = buffer + bufferPos;
+    const char* const limit = buffer + buffer.getFillSize();
+    const char* const equals = findByte(name, limit, kNameEnds);
+    if (equals == name || limit - equals < 2 || *equals != '=' || (equals[1] != '"' && equals[1] != '\''))
+        return nullptr;
+    const char* const value = equals + 2;
+    const char* const end = findByte(value, limit, kValueEnds);
+    if (end == limit || *end != equals[1] || equals - name > kMaxAttributeName ||
+        end - value > kMaxAttributeValue)
+        return nullptr;
+    bufferPos += static_cast<uint32>(end + 1 - name);
+    lastLineEnd = 0;
+    return makeAttribute(name, static_cast<int>(equals - name), value, static_cast<int>(end - value));
+}
+
+FXmlAttribute* FXmlParser::makeAttribute(const char* name, int nameLength, const char* value, int valueLength)
+{
+    FXmlAttribute* attribute = takeAttribute();
+    attribute->name.assign(name, nameLength, false);
+    attribute->value.assign(value, valueLength, false);
+    return attribute;
+}
+
 // Gives null where the token is none. The attribute's reference is the caller's until `recycle`.
 FXmlAttribute* FXmlParser::tokenToAttribute(char* token, int64 size)
 {
@@ -248,16 +305,18 @@ FXmlAttribute* FXmlParser::tokenToAttribute(char* token, int64 size)
     while (equals < end && Xml::isXmlSpace(*equals))
         equals++;
     char* value = equals + 2;
-    if (nameEnd - token > kMaxAttributeName || value >= end || *equals != '=' ||
-        end - 1 - value > kMaxAttributeValue)
+    auto length = static_cast<int>(end - 1 - value);
+    if (nameEnd - token > kMaxAttributeName || value >= end || *equals != '=' || length > kMaxAttributeValue)
         return nullptr;
     end[-1] = 0;
 
     bool sawHighBit = false;
-    removeEntities(value, &sawHighBit, (flags & kWindowsEntities) != 0);
-    FXmlAttribute* attribute = takeAttribute();
-    attribute->name.assign(token, static_cast<int>(nameEnd - token), false);
-    attribute->value.assign(value, static_cast<int>(strlen(value)), false);
+    if (memchr(value, '&', static_cast<size_t>(length)))
+    {
+        removeEntities(value, &sawHighBit, (flags & kWindowsEntities) != 0);
+        length = static_cast<int>(strlen(value));
+    }
+    FXmlAttribute* attribute = makeAttribute(token, static_cast<int>(nameEnd - token), value, length);
     if (sawHighBit && (flags & kWidenValues))
         attribute->value.toWideString(codePage);
     return attribute;
@@ -273,9 +332,11 @@ FXmlAttribute* FXmlParser::takeAttribute()
     return attribute;
 }
 
+// In such an order that the next tag's first attribute gets the object of this one's: its texts have often the size
+// that is needed again.
 void FXmlParser::recycle(CmArray& attributes)
 {
-    for (int i = 0; i < attributes.total(); i++)
+    for (int i = attributes.total() - 1; i >= 0; i--)
         if (!attributePool.add(attributes.at(i)))
             attributes.at(i)->release();
 }

@@ -168,6 +168,8 @@ private:
     void settleLookAhead();
     template <class Predicate>
     Run copyUntil(TokenText& token, Predicate ends);
+    void skipBlanks();
+    void skipLayout();
     void skipSpace();
     void countLines(const char* text, size_t length);
 
@@ -176,6 +178,7 @@ private:
     Token readTagPart(TokenText& token);
     Token readMarkup(TokenText& token);
     Token readAttribute(TokenText& token);
+    Run copyValue(TokenText& token, char quote);
     Token readLineEnd(TokenText& token);
     Token readData(TokenText& token);
     Token readDeclaration(TokenText& token);
@@ -198,7 +201,9 @@ private:
     void skipDocType();
     bool skipPast(const char* end);
     void tellComment(TokenText& text, bool report, void* data, bool endOfComment);
+    FXmlAttribute* takePlainAttribute();
     FXmlAttribute* tokenToAttribute(char* token, int64 size);
+    FXmlAttribute* makeAttribute(const char* name, int nameLength, const char* value, int valueLength);
     FXmlAttribute* takeAttribute();
     void recycle(CmArray& attributes);
     void fail(Error code);

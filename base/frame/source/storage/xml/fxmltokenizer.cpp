@@ -90,6 +90,33 @@ bool FXmlParser::startsWith(const char* text, uint32 length)
     return true;
 }
 
+namespace
+{
+bool isBlank(char c)
+{
+    return c == ' ' || c == '\t';
+}
+
+/// The byte that ends a run, where there is only one.
+struct Is
+{
+    bool operator()(char c) const { return c == wanted; }
+    char wanted;
+};
+
+template <class Predicate>
+const char* findEnd(const char* begin, const char* limit, Predicate ends)
+{
+    return std::find_if(begin, limit, ends);
+}
+
+const char* findEnd(const char* begin, const char* limit, Is end)
+{
+    const void* found = memchr(begin, end.wanted, static_cast<size_t>(limit - begin));
+    return found ? static_cast<const char*>(found) : limit;
+}
+} // namespace
+
 template <class Predicate>
 FXmlParser::Run FXmlParser::copyUntil(TokenText& token, Predicate ends)
 {
@@ -98,7 +125,7 @@ FXmlParser::Run FXmlParser::copyUntil(TokenText& token, Predicate ends)
         const char* begin = buffer + bufferPos;
         const size_t count = std::min<size_t>(buffer.getFillSize() - bufferPos, kMaxToken - token.length);
         const char* limit = begin + count;
-        const char* place = std::find_if(begin, limit, ends);
+        const char* place = findEnd(begin, limit, ends);
         token.add(begin, static_cast<size_t>(place - begin));
         bufferPos += static_cast<uint32>(place - begin);
         if (place != limit)
@@ -107,6 +134,30 @@ FXmlParser::Run FXmlParser::copyUntil(TokenText& token, Predicate ends)
             return hasByte() && ends(frontByte()) ? Run::kStopped : Run::kFull;
     }
     return Run::kEnded;
+}
+
+void FXmlParser::skipBlanks()
+{
+    settleLookAhead();
+    while (hasByte() && isBlank(frontByte()))
+        bufferPos++;
+}
+
+// What getNextToken would give as tokens that nobody looks at.
+void FXmlParser::skipLayout()
+{
+    settleLookAhead();
+    TokenText unused(tokenBuffer.ptr());
+    while (hasByte())
+    {
+        const char c = frontByte();
+        if (c == '\r' || c == '\n')
+            readLineEnd(unused);
+        else if (isBlank(c) && !(flags & kKeepSpaces))
+            bufferPos++;
+        else
+            return;
+    }
 }
 
 void FXmlParser::skipSpace()
@@ -118,7 +169,11 @@ void FXmlParser::skipSpace()
 // For line ends that are no tokens. Each pair of two different ones counts once, also where it comes in two pieces.
 void FXmlParser::countLines(const char* text, size_t length)
 {
-    if (lastLineEnd == 0 && !memchr(text, '\n', length) && !memchr(text, '\r', length))
+    // Tested as a whole, since most texts have none, the loop fits in wide registers.
+    bool hasLineEnd = lastLineEnd != 0;
+    for (size_t i = 0; i < length; i++)
+        hasLineEnd |= (text[i] == '\n') | (text[i] == '\r');
+    if (!hasLineEnd)
         return;
     for (size_t i = 0; i < length; i++)
     {
@@ -151,11 +206,10 @@ FXmlParser::Token FXmlParser::readToken(TokenText& token, bool insideTag)
     if (!hasByte())
         return kEndOfData;
     const char c = frontByte();
-    const bool isBlank = c == ' ' || c == '\t';
     // Inside a tag blanks only part the attributes, so they are folded there in any case.
-    if (isBlank && (insideTag || !(flags & kKeepSpaces)))
+    if (isBlank(c) && (insideTag || !(flags & kKeepSpaces)))
     {
-        copyUntil(token, [](char next) { return next != ' ' && next != '\t'; });
+        copyUntil(token, [](char next) { return !isBlank(next); });
         return kSpace;
     }
     if (c == '\r' || c == '\n')
@@ -209,9 +263,7 @@ FXmlParser::Token FXmlParser::readAttribute(TokenText& token)
         return kMalformed;
     bufferPos++;
 
-    const char protector = (flags & kBackslashProtects) ? '\\' : quote;
-    const auto endsRun = [quote, protector](char c) { return c == quote || c == protector; };
-    while (copyUntil(token, endsRun) == Run::kStopped)
+    while (copyValue(token, quote) == Run::kStopped)
     {
         const char c = frontByte();
         if (!token.add(c))
@@ -229,10 +281,17 @@ FXmlParser::Token FXmlParser::readAttribute(TokenText& token)
     return kMalformed;
 }
 
+FXmlParser::Run FXmlParser::copyValue(TokenText& token, char quote)
+{
+    if (flags & kBackslashProtects)
+        return copyUntil(token, [quote](char c) { return c == quote || c == '\\'; });
+    return copyUntil(token, Is{quote});
+}
+
 // A '<' that doesn't begin the end of the innermost element is part of the data, whatever follows it.
 FXmlParser::Token FXmlParser::readData(TokenText& token)
 {
-    while (copyUntil(token, [](char c) { return c == '<'; }) == Run::kStopped)
+    while (copyUntil(token, Is{'<'}) == Run::kStopped)
     {
         if (endsData() || !token.add('<'))
             break;
@@ -317,7 +376,7 @@ void FXmlParser::handleData(int64 size, void* data)
     {
         TokenText piece(tokenBuffer.ptr());
         Run run = Run::kStopped;
-        while ((run = copyUntil(piece, [](char c) { return c == '<'; })) == Run::kStopped)
+        while ((run = copyUntil(piece, Is{'<'})) == Run::kStopped)
         {
             ended = hasBytes(2) && beginsMarkup(buffer.ptr()[bufferPos + 1]);
             if (ended || !piece.add('<'))

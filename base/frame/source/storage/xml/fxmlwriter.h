@@ -4,6 +4,8 @@
 #include "containers/value/buffer.h"
 #include "foundation/object/iptr.h"
 
+#include <string_view>
+
 class CmContainer;
 class FStream;
 class IBStream;
@@ -47,6 +49,7 @@ public:
     /// Append a text to a buffer with entities in place of what markup needs, without a terminator.
     /// 16-bit text comes out in UTF-8.
     static void encodeString(Buffer& out, const char16* text);
+    static void encodeString(Buffer& out, std::u16string_view text);
     /// With `utf8` the four characters of markup are named and all other bytes pass. Without, every character that
     /// the table of the older parser names for writing is, '$' and '^' among them, and a byte of 0x80 or more becomes
     /// a number.

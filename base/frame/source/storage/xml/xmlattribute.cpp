@@ -2,6 +2,7 @@
 
 #include "containers/value/buffer.h"
 #include "storage/xml/fxmlwriter.h"
+#include "storage/xml/xmltext.h"
 
 namespace Xml
 {
@@ -20,9 +21,9 @@ void Attribute::setValue(const ConstString& text)
 
 void Attribute::print(Buffer& out) const
 {
-    FXmlWriter::encodeString(out, name.text16());
+    FXmlWriter::encodeString(out, viewOf(name));
     out.put("=\"", 2);
-    FXmlWriter::encodeString(out, value.text16());
+    FXmlWriter::encodeString(out, viewOf(value));
     out.put('"');
 }
 } // namespace Xml

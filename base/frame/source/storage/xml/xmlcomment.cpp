@@ -10,7 +10,7 @@ Comment::Comment(const ConstString& text) : Node(text) {}
 void Comment::print(Buffer& out) const
 {
     out.put("<!--", 4);
-    appendUtf8(out, name.text16());
+    appendUtf8(out, viewOf(name));
     out.put("-->", 3);
 }
 } // namespace Xml

@@ -13,9 +13,9 @@ namespace
 /// What a small block of memory costs beyond its bytes.
 constexpr size_t kBlockCost = 16;
 
-size_t wideCost(const char* text)
+size_t wideCost(size_t length)
 {
-    return 2 * (strlen(text) + 1) + kBlockCost;
+    return 2 * (length + 1) + kBlockCost;
 }
 } // namespace
 
@@ -37,9 +37,10 @@ void DocumentParser::startTag(INewXmlParser* from, const char* tag, const char**
 {
     if (finished)
         return;
-    charge(from, sizeof(Element) + kBlockCost + wideCost(tag));
-    auto* element = new Element(ConstString(), current);
-    assignUtf8(element->name, tag);
+    const size_t length = strlen(tag);
+    charge(from, sizeof(Element) + kBlockCost + wideCost(length));
+    auto* element = new Element;
+    assignUtf8(element->name, tag, length);
     addAttributes(from, *element, attributes);
     if (current)
         current->linkBefore(element, nullptr);
@@ -56,11 +57,16 @@ void DocumentParser::addAttributes(INewXmlParser* from, Element& element, const 
     element.attributes.resize(count / 2);
     for (int i = 0; i + 1 < count; i += 2)
     {
-        charge(from, sizeof(Attribute) + kBlockCost + wideCost(attributes[i]) + wideCost(attributes[i + 1]));
-        IPtr<Attribute> attribute = adopt(new Attribute);
-        assignUtf8(attribute->name, attributes[i]);
-        assignUtf8(attribute->value, attributes[i + 1]);
-        element.attributes.add(attribute);
+        const size_t nameLength = strlen(attributes[i]);
+        const size_t valueLength = strlen(attributes[i + 1]);
+        charge(from, sizeof(Attribute) + kBlockCost + wideCost(nameLength) + wideCost(valueLength));
+        // The place first, then the attribute in it: so no reference is counted up and down on the way.
+        if (!element.attributes.add(nullptr))
+            return;
+        auto* attribute = new Attribute;
+        element.attributes[i / 2] = adopt(attribute);
+        assignUtf8(attribute->name, attributes[i], nameLength);
+        assignUtf8(attribute->value, attributes[i + 1], valueLength);
     }
 }
 
@@ -86,7 +92,7 @@ void DocumentParser::comment(INewXmlParser* from, const char* text)
 {
     if (finished || !current)
         return;
-    charge(from, sizeof(Comment) + kBlockCost + wideCost(text));
+    charge(from, sizeof(Comment) + kBlockCost + wideCost(strlen(text)));
     auto* node = new Comment(ConstString());
     assignUtf8(node->name, text);
     current->linkBefore(node, nullptr);

@@ -303,7 +303,7 @@ bool Element::printTree(Buffer& out, IBStream* stream) const
 void Element::printStart(Buffer& out) const
 {
     out.put('<');
-    appendUtf8(out, name.text16());
+    appendUtf8(out, viewOf(name));
     for (const IPtr<Attribute>& attribute : attributes)
     {
         out.put(' ');
@@ -320,7 +320,7 @@ void Element::printEnd(Buffer& out) const
     if (!first)
         return;
     out.put("</", 2);
-    appendUtf8(out, name.text16());
+    appendUtf8(out, viewOf(name));
     out.put('>');
 }
 } // namespace Xml

@@ -66,6 +66,8 @@ protected:
 private:
     friend class DocumentParser;
 
+    /// Without a name.
+    Element() : attributes(0, 4) {}
     bool canAdopt(Node* child) const;
     void linkBefore(Node* child, Node* place);
     void unlink(Node* child);

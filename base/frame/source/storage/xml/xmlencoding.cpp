@@ -3,6 +3,7 @@
 #include "storage/xml/xmlentities.h"
 #include "storage/xml/xmltext.h"
 
+#include <algorithm>
 #include <array>
 #include <cstdio>
 #include <cstring>
@@ -42,9 +43,33 @@ void appendName(Buffer& out, const char* name)
     out.put(';');
 }
 
-bool isMarkup(char16 c)
+/// The characters of ASCII that are no markup.
+constexpr std::array<bool, 0x80> makePlainCharacters()
 {
-    return c < 0x80 && namesForMarkup()[c];
+    std::array<bool, 0x80> plain{};
+    for (unsigned c = 0; c < plain.size(); c++)
+        plain[c] = c != '&' && c != '<' && c != '>' && c != '"';
+    return plain;
+}
+constexpr std::array<bool, 0x80> kPlain = makePlainCharacters();
+
+bool isPlain(char16 c)
+{
+    return c < kPlain.size() && kPlain[c];
+}
+
+/// Appends the characters up to the first one that isn't plain; gives their number.
+size_t appendPlain(Buffer& out, std::u16string_view text)
+{
+    const uint32 before = out.getFillSize();
+    if (!out.grow(before + static_cast<uint32>(text.size())))
+        return text.size();
+    char* to = out + before;
+    size_t count = 0;
+    for (; count < text.size() && isPlain(text[count]); count++)
+        to[count] = static_cast<char>(text[count]);
+    out.setFillSize(before + static_cast<uint32>(count));
+    return count;
 }
 } // namespace
 
@@ -74,15 +99,26 @@ void FXmlWriter::encodeString(Buffer& out, const char* text, bool utf8)
 
 void FXmlWriter::encodeString(Buffer& out, const char16* text)
 {
-    const std::u16string_view whole(text ? text : u"");
-    size_t done = 0;
-    for (size_t i = 0; i < whole.size(); i++)
+    encodeString(out, std::u16string_view(text ? text : u""));
+}
+
+void FXmlWriter::encodeString(Buffer& out, std::u16string_view text)
+{
+    while (true)
     {
-        if (!isMarkup(whole[i]))
+        text.remove_prefix(appendPlain(out, text));
+        if (text.empty())
+            return;
+        if (text[0] < kPlain.size())
+        {
+            appendName(out, namesForMarkup()[text[0]]);
+            text.remove_prefix(1);
             continue;
-        Xml::appendUtf8(out, whole.substr(done, i - done));
-        appendName(out, namesForMarkup()[whole[i]]);
-        done = i + 1;
+        }
+        // Both halves of a pair stand in one run.
+        const size_t run =
+            std::find_if(text.begin(), text.end(), [](char16 c) { return c < kPlain.size(); }) - text.begin();
+        Xml::appendUtf8(out, text.substr(0, run));
+        text.remove_prefix(run);
     }
-    Xml::appendUtf8(out, whole.substr(done));
 }

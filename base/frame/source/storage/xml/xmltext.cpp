@@ -19,7 +19,7 @@ void assignUtf8(String& target, const char* text, size_t length)
     if (count < length)
         if (void* fitting = realloc(wide, (count + 1) * sizeof(char16)))
             wide = static_cast<char16*>(fitting);
-    target.take(wide, true);
+    target.take(wide, true, static_cast<unsigned>(count));
 }
 
 void assignUtf8(String& target, const char* text)

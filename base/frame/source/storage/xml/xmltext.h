@@ -12,6 +12,13 @@ namespace Xml
 void assignUtf8(String& target, const char* text, size_t length);
 void assignUtf8(String& target, const char* text);
 
+/// The characters of a text, which is made wide where it isn't.
+inline std::u16string_view viewOf(const String& text)
+{
+    const char16* characters = text.text16();
+    return {characters, text.length()};
+}
+
 /// Whether the bytes are tabs, line ends and blanks alone.
 bool isXmlSpace(const char* text, size_t length);
 inline bool isXmlSpace(char c)
