@@ -8,6 +8,11 @@ bool parseArchiveInteger(const char* text, long long& value)
 {
     if (!text)
         return false;
+    const char* textEnd = text + strlen(text);
+    const auto result = std::from_chars(text, textEnd, value);
+    if (result.ec == std::errc() && result.ptr == textEnd)
+        return true;
+    // Blanks, signs and numbers out of range, and what stands behind a number.
     char* end = nullptr;
     value = strtoll(text, &end, 10);
     return end != text;

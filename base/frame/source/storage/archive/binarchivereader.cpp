@@ -174,7 +174,7 @@ bool BinArchiveReader::readText(FAttributeValue& value, unsigned type)
     }
     FString wide;
     wide.fromUTF8(text.ptr());
-    value.setString16(wide.text16());
+    value.takeString(wide);
     return true;
 }
 

@@ -10,6 +10,7 @@
 #include "storage/xml/fxmlattribute.h"
 
 #include <cstring>
+#include <string_view>
 
 /// A tag, the place where it may stand, and what reads it.
 struct FXmlArchiveParser::Handler
@@ -21,18 +22,18 @@ struct FXmlArchiveParser::Handler
 
 namespace
 {
-FString* findValue(const CmContainer& attributes, const char* name)
+FString* findValue(const CmContainer& attributes, std::string_view name)
 {
-    for (int i = 0; i < attributes.total(); i++)
+    for (int i = 0, count = attributes.total(); i < count; i++)
     {
         auto* attribute = static_cast<FXmlAttribute*>(attributes.at(i));
-        if (strcmp(attribute->name.text8(), name) == 0)
+        if (std::string_view(attribute->name.text8(), attribute->name.length()) == name)
             return &attribute->value;
     }
     return nullptr;
 }
 
-const char* findText(const CmContainer& attributes, const char* name)
+const char* findText(const CmContainer& attributes, std::string_view name)
 {
     const FString* value = findValue(attributes, name);
     return value ? value->text8() : nullptr;
@@ -235,7 +236,8 @@ bool FXmlArchiveParser::startString(CmContainer& attributes)
     const char* wide = findText(attributes, "wide");
     if (wide && strcmp(wide, "true") == 0)
         value->toWideString(kEncodingUtf8);
-    return tree->set(name, *value);
+    tree->entry(name).takeString(*value);
+    return true;
 }
 
 bool FXmlArchiveParser::startBinary(CmContainer& attributes)

@@ -59,8 +59,13 @@ private:
 
     static Key usableKey(Key key);
     int find(Key key) const;
-    int findSorted(Key key) const;
     void addRead(std::vector<IPtr<Entry>>& read);
+    /// The place of the first entry that doesn't sort before `key`.
+    int placeOf(Key key) const;
+    bool isAt(int place, Key key) const
+    {
+        return place < Container::total() && entryAt(place)->compareKey(key) == 0;
+    }
 };
 
 using FStringAttributeList = FAttributeList<FStringIDAttribute, const char*, CmOrderedArray>;
@@ -79,34 +84,35 @@ Key FAttributeList<Entry, Key, Container>::usableKey(Key key)
 template <class Entry, class Key, class Container>
 int FAttributeList<Entry, Key, Container>::find(Key key) const
 {
+    const Key wanted = usableKey(key);
     if constexpr (isOrdered)
-        return findSorted(usableKey(key));
+    {
+        const int place = placeOf(wanted);
+        return isAt(place, wanted) ? place : -1;
+    }
     for (int i = 0, count = Container::total(); i < count; i++)
-        if (entryAt(i)->compareKey(usableKey(key)) == 0)
+        if (entryAt(i)->compareKey(wanted) == 0)
             return i;
     return -1;
 }
 
 template <class Entry, class Key, class Container>
-int FAttributeList<Entry, Key, Container>::findSorted(Key key) const
+int FAttributeList<Entry, Key, Container>::placeOf(Key key) const
 {
     int first = 0;
-    int last = Container::total() - 1;
+    int end = Container::total();
     // Who fills a list in the order of its keys is answered by the first comparison.
-    if (last >= 0 && entryAt(last)->compareKey(key) < 0)
-        return -1;
-    while (first <= last)
+    if (end > 0 && entryAt(end - 1)->compareKey(key) < 0)
+        return end;
+    while (first < end)
     {
-        const int middle = first + (last - first) / 2;
-        const int order = entryAt(middle)->compareKey(key);
-        if (order == 0)
-            return middle;
-        if (order < 0)
+        const int middle = first + (end - first) / 2;
+        if (entryAt(middle)->compareKey(key) < 0)
             first = middle + 1;
         else
-            last = middle - 1;
+            end = middle;
     }
-    return -1;
+    return first;
 }
 
 template <class Entry, class Key, class Container>
@@ -126,10 +132,17 @@ CmObject* FAttributeList<Entry, Key, Container>::getObjAttribute(Key key) const
 template <class Entry, class Key, class Container>
 Entry& FAttributeList<Entry, Key, Container>::entry(Key key)
 {
-    if (Entry* found = getAttribute(key))
-        return *found;
-    auto* added = new Entry(usableKey(key));
-    Container::add(added);
+    const Key wanted = usableKey(key);
+    int place = Container::total();
+    if constexpr (isOrdered)
+        place = placeOf(wanted);
+    else if (const int found = find(wanted); found >= 0)
+        place = found;
+    if (isAt(place, wanted))
+        return *entryAt(place);
+    auto* added = new Entry(wanted);
+    if (Container::makeRoom())
+        Container::insert(place, added);
     return *added;
 }
 

@@ -189,6 +189,15 @@ void FAttributeValue::setTString(const ConstString& text, bool borrow)
         setString(static_cast<const char*>(text.text()), borrow);
 }
 
+void FAttributeValue::takeString(String& text)
+{
+    auto* taken = new CmString;
+    static_cast<String&>(*taken).take(text);
+    empty();
+    value.string = taken;
+    setType(taken->isWideString() ? kString | kWide : unsigned{kString});
+}
+
 long long FAttributeValue::getLong() const
 {
     if (type & kInteger)

@@ -63,6 +63,8 @@ class FAttributeValue : public CmObject
     void setString8(const char* text);
     /// Takes a text of either width.
     void setTString(const ConstString& text, bool borrow);
+    /// Takes over the characters of a text, which is empty then.
+    void takeString(String& text);
 
     /// 0 where the value is no number; a double is cut, and held within the range.
     long long getLong() const;
