@@ -166,7 +166,7 @@ std::vector<Inputs::Member> makeTree()
 
 // Texts
 
-constexpr size_t kTextSize = 65536;
+constexpr size_t kTextSize = 16384;
 
 std::string makeMixed()
 {

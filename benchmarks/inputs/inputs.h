@@ -35,7 +35,7 @@ struct Member
 /// and of the values in each are in no order.
 const std::vector<Member>& tree();
 
-/// 64 KiB of UTF-8 each: English words; the same with an accented letter or a sign in about every eighth word;
+/// 16 KiB of UTF-8 each: English words; the same with an accented letter or a sign in about every eighth word;
 /// Japanese sentences.
 const std::string& asciiText();
 const std::string& mixedText();
