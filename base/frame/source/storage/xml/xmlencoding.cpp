@@ -3,7 +3,6 @@
 #include "storage/xml/xmlentities.h"
 #include "storage/xml/xmltext.h"
 
-#include <algorithm>
 #include <array>
 #include <cstdio>
 #include <cstring>
@@ -116,8 +115,9 @@ void FXmlWriter::encodeString(Buffer& out, std::u16string_view text)
             continue;
         }
         // Both halves of a pair stand in one run.
-        const size_t run =
-            std::find_if(text.begin(), text.end(), [](char16 c) { return c < kPlain.size(); }) - text.begin();
+        size_t run = 1;
+        while (run < text.size() && text[run] >= kPlain.size())
+            run++;
         Xml::appendUtf8(out, text.substr(0, run));
         text.remove_prefix(run);
     }
