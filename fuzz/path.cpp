@@ -26,7 +26,10 @@ void changePath(FNPath& path, const FNPath& other, const std::u16string& text)
     path.getNameWithoutExtension(ignored, true);
     path.createURL(ignored);
     FNPath relative;
-    if (relative.assignRelative(&path, &other))
+    // Each folder of the one is compared with each of the other: a matter of paths that the platform takes.
+    const bool isUsable =
+        path.platformPath().size() < FNPath::kMaxPathLength && text.size() < FNPath::kMaxPathLength;
+    if (isUsable && relative.assignRelative(&path, &other))
         relative.makeAbsolute(&other);
     path.isInDir(&other);
     require(path.compare(&path) == 0 && path.isEqual(&path) &&

@@ -22,7 +22,7 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size)
 
     FString coded(text.c_str());
     FUrl::urlEncode(coded);
-    require(coded.isAsciiString() && coded.length() >= 0);
+    require(coded.isAsciiString() && coded.length() >= text.size());
     FString decoded(text.c_str());
     FUrl::urlDecode(decoded);
     require(decoded.length() <= 3 * text.size());
