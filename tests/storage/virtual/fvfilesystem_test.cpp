@@ -139,6 +139,8 @@ TEST_F(VirtualFilesTest, ChangesNothingUnlessAllowed)
 TEST_F(VirtualFilesTest, WhatCannotBeMountedShows)
 {
     EXPECT_FALSE(adopt(new FVFileSystem(at("missing", FPath::kFolder), false))->verify());
+    FPath plain(FString((root + "/missing").c_str()).text16(), FPath::kFolder);
+    EXPECT_FALSE(adopt(new FVFileSystem(&plain, false))->verify());
     const IPtr<FVFileSystem> noMount = adopt(new FVFileSystem(at("secret"), false));
     EXPECT_FALSE(noMount->verify());
     EXPECT_EQ(read(*noMount, u"a"), "null");
@@ -172,6 +174,10 @@ TEST_F(VirtualFilesTest, IsFoundByNameAndCopiesInAndOut)
     EXPECT_EQ(contentOf("a.png"), "png");
     EXPECT_TRUE(files->copyFile(at("secret"), &fresh, nullptr, nullptr));
     EXPECT_EQ(contentOf("skin/new/b"), "secret");
+    EXPECT_FALSE(files->copyFile(&image, at("skin/images/a.png"), nullptr, nullptr)) << "both are one file";
+    EXPECT_FALSE(files->copyFile(at("skin/images/a.png"), &image, nullptr, nullptr));
+    EXPECT_FALSE(files->copyFile(&image, &image, nullptr, nullptr));
+    EXPECT_EQ(contentOf("skin/images/a.png"), "png");
     skin->enableWrite(false);
     EXPECT_FALSE(files->copyFile(at("out"), &fresh, nullptr, nullptr));
     EXPECT_EQ(contentOf("skin/new/b"), "secret");

@@ -2,16 +2,17 @@
 
 #include "storage/filesystem/fnfilesystem.h"
 #include "storage/filesystem/iarchivelookup.h"
-#include "storage/path/fpath.h"
+#include "storage/path/fnpath.h"
 #include "storage/stream/fstream.h"
+#include "storage/virtual/fvfilesystem.h"
 #include "storage/virtual/innerpath.h"
 
 namespace
 {
-/// A path with the file system that serves it.
+/// A path with the file system that serves it in the end, behind all mounts; none where that isn't allowed.
 struct Place
 {
-    explicit Place(FPath* outer) : files(gFileSystem), path(outer)
+    Place(FPath* outer, bool isToWrite) : files(gFileSystem), path(outer)
     {
         IArchiveLookup* archives = IArchiveLookup::instance();
         const IPtr<FFileSystem> archive = archives ? adopt(archives->getFileSystem(outer)) : nullptr;
@@ -19,11 +20,32 @@ struct Place
             return;
         files = archive;
         path = adopt(archives->getPath(*outer));
+        while (const FVFileSystem* mounted = FCast(FVFileSystem, static_cast<FObject*>(files.get())))
+        {
+            path = isToWrite && !mounted->isWritable() ? nullptr : mounted->translatePath(path);
+            files = path ? IPtr<FFileSystem>(mounted->getTarget()) : nullptr;
+        }
+    }
+
+    /// Whether it is on disk, and no URL.
+    bool isNative() const
+    {
+        return FCast(FNFileSystem, static_cast<FObject*>(files.get())) &&
+               FNFileSystem::getNativePathFromPath(path);
     }
 
     IPtr<FFileSystem> files;
     IPtr<FPath> path;
 };
+
+/// Whether both are one file, which making the target would empty.
+bool areSame(const Place& source, const Place& target)
+{
+    std::vector<FString> inSource;
+    std::vector<FString> inTarget;
+    return source.files == target.files && InnerPath::split(*source.path, inSource) &&
+           InnerPath::split(*target.path, inTarget) && inSource == inTarget;
+}
 
 bool copyStream(const Place& target, FStream& source, UProgressHook* hook, int* error)
 {
@@ -48,12 +70,16 @@ bool copyAcrossArchives(FPath* from, FPath* to, UProgressHook* hook, int* error)
 {
     if (!from || !to)
         return false;
-    const Place source(from);
+    const Place source(from, false);
     IPtr<FPath> goal = to;
-    if (to->isFolder())
+    if (to->isFolder() && source.path)
         goal = InnerPath::childOf(*to, source.path->getName(), FPath::kFile);
-    const Place target(goal);
+    const Place target(goal, true);
     if (!source.files || !target.files)
+        return false;
+    if (source.isNative() && target.isNative())
+        return target.files->copyFile(source.path, target.path, hook, error);
+    if (areSame(source, target))
         return false;
     FStream* stream = source.files->openFile(source.path, kFileRead | kFileShare, error);
     if (!stream)

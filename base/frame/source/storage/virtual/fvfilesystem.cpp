@@ -75,10 +75,10 @@ IPtr<FFileSystem> FVFileSystem::mountFile(FPath& mounted)
 
 bool FVFileSystem::verify() const
 {
-    if (!target)
-        return false;
-    auto* folder = FCast(FNPath, static_cast<FObject*>(root.get()));
-    return !folder || target.get() != gFileSystem || gFileSystem->dirExists(folder);
+    if (!target || !root || target.get() != gFileSystem)
+        return target != nullptr;
+    const IPtr<FNPath> folder = FNFileSystem::getNativePathFromPath(root);
+    return folder && gFileSystem->dirExists(folder);
 }
 
 // Paths
