@@ -99,12 +99,26 @@ class BoxFiles : public FObject, public IVirtualFileSystem
     int32 unmount() override
     {
         unmounts++;
-        return kResultOk;
+        return isStubborn ? 1 : kResultOk;
     }
 
     Box box;
     bool isAble = true;
+    bool isStubborn = false;
     int unmounts = 0;
+};
+
+/// A stream of a component that notes whether its file system can be unmounted while it ends.
+class LastStream : public FMemoryStream
+{
+    DECLARE_TYPE(LastStream, FMemoryStream)
+
+    LastStream(FFileSystemAdapter* itsFiles, bool& result) : files(itsFiles), wasUnmounted(result) {}
+    ~LastStream() override { wasUnmounted = files->unmount(); }
+
+private:
+    FFileSystemAdapter* files;
+    bool& wasUnmounted;
 };
 
 class AdapterTest : public FileTest
@@ -198,6 +212,8 @@ TEST_F(AdapterTest, StaysMountedWhileAStreamIsOpen)
     manager->unmountUnusedVirtualFileSystems();
     EXPECT_TRUE(manager->containsArchive(u"box"));
     EXPECT_EQ(plugin->unmounts, 0);
+    manager->registerArchive(adapter, u"alias", u"alias");
+    manager->unregisterArchive(adapter);
 
     adapter = nullptr;
     files->closeFile(stream);
@@ -207,10 +223,28 @@ TEST_F(AdapterTest, StaysMountedWhileAStreamIsOpen)
     EXPECT_EQ(plugin->getRefCount(), 1u);
 }
 
+TEST_F(AdapterTest, AStreamEndsBeforeItsFileSystemMayGo)
+{
+    const IPtr<FFileSystemAdapter> adapter = adopt(new FFileSystemAdapter(plugin));
+    bool wasUnmounted = true;
+    plugin->box["/a"] = adopt(new LastStream(adapter, wasUnmounted));
+    FPath path(u"/a", FPath::kFile);
+    FStream* stream = adapter->openFile(&path, kFileRead, nullptr);
+    plugin->box.clear();
+    stream->release();
+    EXPECT_FALSE(wasUnmounted);
+    EXPECT_TRUE(adapter->unmount());
+}
+
 TEST_F(AdapterTest, AnUnmountedOneOpensNothing)
 {
     plugin->box["/a"] = adopt(new FMemoryStream);
     const IPtr<FFileSystemAdapter> adapter = adopt(new FFileSystemAdapter(plugin));
+    plugin->isStubborn = true;
+    EXPECT_FALSE(adapter->unmount());
+    plugin->isStubborn = false;
+    FPath stays(u"/a", FPath::kFile);
+    EXPECT_TRUE(adapter->fileExists(&stays)) << "mounted still";
     EXPECT_TRUE(adapter->unmount());
     FPath path(u"/a", FPath::kFile);
     EXPECT_EQ(adapter->openFile(&path, kFileRead, nullptr), nullptr);

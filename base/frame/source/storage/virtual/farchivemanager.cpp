@@ -113,6 +113,9 @@ bool FArchiveManager::unregisterArchive(FFileSystem* files)
         return true;
     gone = walk.current().value;
     entries.remove(gone->getKey());
+    for (auto rest = entries.iterate(); !rest.done(); rest.next())
+        if (rest.current().value->getFileSystem() == files)
+            return true;
     for (TLinkedListIterator<IPtr<FRemovableFileSystem>> it(removable); !it.done(); it.next())
         if (it.current()->getFileSystem() == files)
             goneView = it.current();

@@ -69,7 +69,11 @@ bool FFileSystemAdapter::unmount()
         leaving = plugin;
         plugin = nullptr;
     }
-    return !leaving || leaving->unmount() == kResultOk;
+    if (!leaving || leaving->unmount() == kResultOk)
+        return true;
+    FLockScope guard(lock);
+    plugin = leaving;
+    return false;
 }
 
 void FFileSystemAdapter::notifyStreamDestruction(IBStream*)

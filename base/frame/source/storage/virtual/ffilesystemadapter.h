@@ -31,7 +31,7 @@ class FFileSystemAdapter : public FFileSystem, public FRemovableFileSystem
 
     /// A path as components take it; false where there is none.
     static bool getPathFromUrl(const FPath* path, FString& result);
-    /// Called by a stream when it goes.
+    /// Called when a stream is gone; the pointer says only which it was.
     void notifyStreamDestruction(IBStream* stream);
     /// "1.465 KB", for the user.
     static void makeFileSizeString(double bytes, FString& result);

@@ -10,6 +10,9 @@ FPluginStreamProxy::FPluginStreamProxy(IBStream* plainStream, FFileSystemAdapter
 
 FPluginStreamProxy::~FPluginStreamProxy()
 {
+    // The component's stream goes first: once the adapter is told, the component itself may.
+    IBStream* const gone = plain;
+    plain = nullptr;
     if (files)
-        files->notifyStreamDestruction(getPlainStream());
+        files->notifyStreamDestruction(gone);
 }

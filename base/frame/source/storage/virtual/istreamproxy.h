@@ -26,6 +26,6 @@ class IStreamProxy : public FStream
     using FStream::seek;
     using FStream::tell;
 
-private:
+protected:
     IPtr<IBStream> plain;
 };

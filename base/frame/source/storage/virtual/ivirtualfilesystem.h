@@ -40,7 +40,7 @@ public:
     virtual int32 removeFolder(const char16* path, bool recursive) = 0;
     virtual int32 getFileSize(const char16* path, int64* size) = 0;
     virtual int32 newIterator(const char16* path, bool recursive, IVirtualFileIterator** walk) = 0;
-    /// Nothing is asked afterwards.
+    /// After a success nothing is asked.
     virtual int32 unmount() = 0;
 
     DECLARE_INTERFACE_ID
