@@ -129,18 +129,26 @@ const char* reasonAgainst(const Packing& packing, const std::string& from, const
     if (!gFileSystem->dirExists(&folder))
         return "there is no such folder to pack";
     if (gFileSystem->dirExists(&file))
-        return "the file to write is a folder";
+        return "it can't be packed into a file that is a folder";
     if (isInside(to, from))
         return "the file to write must not lie in the folder";
     const IPtr<FCompressionEngine> engine = adopt(FCompressionStream::createDefaultEngine());
     return packing.compress && !engine ? "compression is not available in this build" : nullptr;
 }
 
+template <class Tell>
+void tellEach(const BoundedTexts& texts, Tell tell)
+{
+    for (const FString& text : texts.getTexts())
+        tell(text);
+    if (texts.getOmitted() > 0)
+        std::fprintf(stderr, "qzr: and %lld more\n", static_cast<long long>(texts.getOmitted()));
+}
+
 int tellLeftOut(const FFileArchive& archive, const char* reason)
 {
-    for (const FString& path : archive.getLeftOut())
-        fail(printable(path), reason);
-    return archive.getLeftOut().empty() ? kDone : kFailed;
+    tellEach(archive.getLeftOut(), [&](const FString& path) { fail(printable(path), reason); });
+    return archive.getLeftOut().getCount() == 0 ? kDone : kFailed;
 }
 
 int pack(const Packing& packing, const std::string& from, const std::string& to)
@@ -205,10 +213,10 @@ int verify(const std::string& file)
         return kFailed;
     ResourceCheck check(*archive);
     const bool isWhole = check.run();
-    for (const FString& problem : check.getProblems())
-        fail(file, printable(problem).c_str());
-    std::printf("%lld files, %lld bytes, %zu problems\n", static_cast<long long>(check.getFileCount()),
-                static_cast<long long>(check.getByteCount()), check.getProblems().size());
+    tellEach(check.getProblems(), [&](const FString& problem) { fail(file, printable(problem).c_str()); });
+    std::printf("%lld files, %lld bytes, %lld problems\n", static_cast<long long>(check.getFileCount()),
+                static_cast<long long>(check.getByteCount()),
+                static_cast<long long>(check.getProblems().getCount()));
     return isWhole ? kDone : kFailed;
 }
 
@@ -219,7 +227,7 @@ int extract(const std::string& file, const std::string& folder)
         return kFailed;
     const bool isWhole = archive->extractAll(pathOf(folder, FPath::kFolder), nullptr);
     tellLeftOut(*archive, "not extracted: it is damaged, its name leads elsewhere, or its place is taken");
-    if (!isWhole && archive->getLeftOut().empty())
+    if (!isWhole && archive->getLeftOut().getCount() == 0)
         return fail(folder, "the folder can't be written");
     const int damage = tellDamage(file, *archive);
     return isWhole ? damage : kFailed;

@@ -183,12 +183,62 @@ TEST_F(ResourceTest, NothingIsExtractedElsewhere)
     put("a.qzr", forged.bytes());
     const IPtr<FResourceArchive> archive = opened("a.qzr");
     EXPECT_FALSE(archive->extractAll(*at("out", FPath::kFolder), nullptr));
-    EXPECT_EQ(archive->getLeftOut().size(), 10u);
+    EXPECT_EQ(archive->getLeftOut().getCount(), 10);
     EXPECT_EQ(contentOf("out/good"), "x");
     EXPECT_EQ(contentOf("target"), "old");
     EXPECT_TRUE(std::filesystem::is_empty(root + "/elsewhere"));
     EXPECT_FALSE(exists("up") || exists("back") || std::filesystem::exists("/tmp/absolute"));
     EXPECT_EQ(std::distance(std::filesystem::directory_iterator(root + "/out"), {}), 4);
+}
+
+TEST_F(ResourceTest, ExtractionReplacesWholeFilesOnly)
+{
+    ForgedFile forged;
+    forged.file(u"good", "new");
+    forged.entry(FResourceEntry::kFile | FResourceEntry::kFolder, 0, 0, u"folder");
+    forged.file(u"in", "x");
+    forged.endFolder();
+    put("a.qzr", forged.bytes());
+    std::filesystem::create_directories(root + "/out");
+    put("out/good", "old");
+    put("out/folder", "a file");
+    std::filesystem::create_hard_link(root + "/out/good", root + "/other name");
+    const IPtr<FResourceArchive> archive = opened("a.qzr");
+    EXPECT_FALSE(archive->extractAll(*at("out", FPath::kFolder), nullptr));
+    EXPECT_EQ(contentOf("out/good"), "new");
+    EXPECT_EQ(contentOf("other name"), "old");
+    EXPECT_EQ(contentOf("out/folder"), "a file");
+    ASSERT_EQ(archive->getLeftOut().getCount(), 1);
+    EXPECT_EQ(utf8(archive->getLeftOut().getTexts()[0]), "/folder");
+
+    FPath good(u"good", FPath::kFile);
+    FFileArchiveNode* node = archive->lookupNode(&good);
+    put("fresh", "kept");
+    static_cast<FResourceEntry*>(node)->setDataOffset(1 << 20);
+    EXPECT_FALSE(archive->extractFile(node, *at("fresh"), nullptr));
+    EXPECT_EQ(contentOf("fresh"), "kept") << "a damaged content takes no file away";
+    EXPECT_FALSE(exists("extracted") || exists("out/extracted"));
+}
+
+TEST_F(ResourceTest, WhatIsSaidOfASmallFileStaysSmall)
+{
+    ForgedFile forged;
+    const std::u16string longName(255, u'n');
+    for (int i = 0; i < FResourceArchive::kMaxDepth; i++)
+        forged.folder(longName.c_str());
+    for (int i = 0; i < 1000; i++)
+        forged.entry(FResourceEntry::kFile, 25, 0, u"/");
+    put("a.qzr", forged.bytes());
+    const IPtr<FResourceArchive> archive = opened("a.qzr");
+    ResourceCheck check(*archive);
+    EXPECT_FALSE(check.run());
+    EXPECT_GE(check.getProblems().getCount(), 1000);
+    uint64 length = 0;
+    for (const FString& text : check.getProblems().getTexts())
+        length += text.length();
+    EXPECT_LE(length, BoundedTexts::kMaxCharacters);
+    EXPECT_EQ(check.getProblems().getOmitted() + static_cast<int64>(check.getProblems().getTexts().size()),
+              check.getProblems().getCount());
 }
 
 TEST_F(ResourceTest, AContentOfTheWrongLengthIsNotExtracted)
@@ -204,7 +254,8 @@ TEST_F(ResourceTest, AContentOfTheWrongLengthIsNotExtracted)
         EXPECT_FALSE(exists("out"));
         ResourceCheck check(*archive);
         EXPECT_FALSE(check.run());
-        EXPECT_EQ(utf8(check.getProblems()[0]), "/b.txt: the content isn't as long as the table says");
+        EXPECT_EQ(utf8(check.getProblems().getTexts()[0]),
+                  "/b.txt: the content isn't as long as the table says");
     }
 }
 
@@ -219,9 +270,9 @@ TEST_F(ResourceTest, TheCheckFindsWhatOverlapsAndWhatIsThereTwice)
     const IPtr<FResourceArchive> archive = opened("a.qzr");
     ResourceCheck check(*archive);
     EXPECT_FALSE(check.run());
-    ASSERT_EQ(check.getProblems().size(), 2u);
-    EXPECT_EQ(utf8(check.getProblems()[0]), "/b: the name is there twice");
-    EXPECT_EQ(utf8(check.getProblems()[1]), "/b: the content overlaps another file's");
+    ASSERT_EQ(check.getProblems().getCount(), 2);
+    EXPECT_EQ(utf8(check.getProblems().getTexts()[0]), "/b: the name is there twice");
+    EXPECT_EQ(utf8(check.getProblems().getTexts()[1]), "/b: the content overlaps another file's");
 }
 
 TEST_F(ResourceTest, ACompressedEntryCannotClaimMoreThanItsBytesHold)

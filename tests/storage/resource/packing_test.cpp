@@ -43,6 +43,10 @@ TEST_F(ResourceTest, TellsHowFarItHasCome)
     EXPECT_EQ(packing.value, packing.maximum);
     EXPECT_TRUE(packing.isRising);
     EXPECT_EQ(packing.texts, "one two b.txt zero \u00FCml\u00E4ut ");
+    Progress compressing;
+    ASSERT_TRUE(pack("b.qzr", kCompress, &compressing));
+    EXPECT_TRUE(compressing.isRising) << "also where a file gets no smaller, and is copied again";
+    EXPECT_EQ(compressing.value, packing.maximum);
     Progress extracting;
     EXPECT_TRUE(opened("a.qzr")->extractAll(*at("out", FPath::kFolder), &extracting));
     EXPECT_EQ(extracting.value, packing.maximum);
@@ -81,10 +85,26 @@ TEST_F(ResourceTest, LeavesOutWhatIsNoPlainFile)
     put("src/stray\xFF", "x");
     const IPtr<FResourceArchive> archive = adopt(new FResourceArchive(at("src/own.qzr"), 0));
     ASSERT_TRUE(archive->create(at("src", FPath::kFolder), 0, nullptr));
-    EXPECT_EQ(archive->getLeftOut().size(), 4u);
+    EXPECT_EQ(archive->getLeftOut().getCount(), 4);
     ASSERT_TRUE(archive->open());
     EXPECT_EQ(listing(*archive), "/b/ /b/one /b/two /b.txt /empty/ /link /zero /\u00FCml\u00E4ut ");
     EXPECT_EQ(read(*archive, u"link"), longText());
+}
+
+TEST_F(ResourceTest, TakesSeveralFoldersAndSingleFiles)
+{
+    std::filesystem::create_directories(root + "/more");
+    put("more/a", "aa");
+    put("more/zz", "zz");
+    const IPtr<FResourceArchive> archive = adopt(new FResourceArchive(at("a.qzr"), 0));
+    ASSERT_TRUE(archive->create(0, nullptr));
+    auto& top = static_cast<FResourceEntry&>(*archive->getRoot());
+    FArchiveProgress progress(nullptr, 0);
+    EXPECT_TRUE(archive->addFolder(at("src", FPath::kFolder), top, progress));
+    EXPECT_TRUE(archive->addFolder(at("more", FPath::kFolder), top, progress));
+    ASSERT_TRUE(archive->close() && archive->open());
+    EXPECT_EQ(listing(*archive), "/a /b/ /b/one /b/two /b.txt /empty/ /zero /zz /\u00FCml\u00E4ut ");
+    EXPECT_EQ(read(*archive, u"zz") + read(*archive, u"b/two"), "zz22");
 }
 
 TEST_F(ResourceTest, ServesSeveralThreads)

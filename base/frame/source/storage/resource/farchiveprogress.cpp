@@ -1,5 +1,6 @@
 #include "storage/resource/farchiveprogress.h"
 
+#include <algorithm>
 #include <limits>
 
 FArchiveProgress::FArchiveProgress(UProgressHook* hook, int64 totalBytes) : outer(hook)
@@ -23,7 +24,8 @@ UProgressHook* FArchiveProgress::nextFile(const ConstString& name)
 
 void FArchiveProgress::setValue(int64 bytes)
 {
-    done = begin + bytes;
+    // A file that gets no smaller by compression is copied again.
+    done = std::max(done, begin + bytes);
     if (outer)
         outer->setValue(done / outer->getValueCompression());
 }

@@ -4,6 +4,7 @@
 #include "foundation/thread/flock.h"
 #include "storage/filesystem/ffilesystem.h"
 #include "storage/path/fnpath.h"
+#include "storage/resource/boundedtexts.h"
 #include "storage/resource/ffilearchivenode.h"
 #include "storage/resource/ffilearchivesubstream.h"
 
@@ -64,13 +65,14 @@ class FFileArchive : public FFileSystem
     CmObject* getTree() const { return tree; }
 
     // Extraction. A name that would lead out of the target folder, also through a link that lies there, is left out.
-    // False where anything is missing afterwards; a file that isn't whole is removed. The hook may be null.
+    // False where anything is missing afterwards. A file that is there already is replaced by a whole one or stays. The hook
+    // may be null.
     bool extractFile(const FFileArchiveNode* node, const FNPath& target, UProgressHook* hook);
     bool extractFolder(const FFileArchiveNode* node, const FNPath& target, UProgressHook* hook);
     /// All of the archive, below `target`.
     bool extractAll(const FNPath& target, UProgressHook* hook);
     /// Full paths of what the last extraction, or the last writing, could not take.
-    const std::vector<FString>& getLeftOut() const { return leftOut; }
+    const BoundedTexts& getLeftOut() const { return leftOut; }
 
     // Cache folder: where files are extracted to for others to open
     /// Null where it can't be told. Borrowed.
@@ -110,7 +112,7 @@ protected:
     IPtr<CmObject> tree;
     /// What an archive without a file is in.
     IPtr<FStream> source;
-    std::vector<FString> leftOut;
+    BoundedTexts leftOut;
 
 private:
     bool extractInto(const FFileArchiveNode& folder, const FNPath& target, FArchiveProgress& progress);

@@ -38,30 +38,33 @@ bool FFileArchive::extractFolder(const FFileArchiveNode* node, const FNPath& tar
     node->countFiles(true, false, &bytes);
     FArchiveProgress progress(hook, static_cast<int64>(bytes));
     leftOut.clear();
-    return extractInto(*node, target, progress);
+    FNPath made(target);
+    made.setPathType(FPath::kFolder);
+    return gFileSystem->createDir(&made) && extractInto(*node, made, progress);
 }
 
 bool FFileArchive::leaveOut(const FFileArchiveNode& node)
 {
+    if (leftOut.isFull())
+    {
+        leftOut.omit();
+        return false;
+    }
     FPath inner;
     node.getPath(inner);
-    leftOut.push_back(InnerPath::textOf(inner));
+    leftOut.add(InnerPath::textOf(inner));
     return false;
 }
 
 bool FFileArchive::extractInto(const FFileArchiveNode& folder, const FNPath& target,
                                FArchiveProgress& progress)
 {
-    FNPath made(target);
-    made.setPathType(FPath::kFolder);
-    if (!gFileSystem->createDir(&made))
-        return false;
     bool isWhole = true;
     for (const IPtr<FFileArchiveNode>& child : folder.getChildren())
     {
         if (progress.wasCanceled())
             return false;
-        isWhole = extractChild(*child, made, progress) && isWhole;
+        isWhole = extractChild(*child, target, progress) && isWhole;
     }
     return isWhole;
 }
@@ -75,7 +78,7 @@ bool FFileArchive::extractChild(const FFileArchiveNode& child, const FNPath& fol
     FNPath place(child.getName().text16(), &folder, type);
     if (!child.isFolder())
         return extractContent(child, place, progress.nextFile(child.getName())) || leaveOut(child);
-    if (gFileSystem->isSymlink(&place))
+    if (gFileSystem->isSymlink(&place) || !gFileSystem->createDir(&place))
         return leaveOut(child);
     return extractInto(child, place, progress);
 }
@@ -93,16 +96,27 @@ bool FFileArchive::extractContent(const FFileArchiveNode& node, FNPath& target, 
 {
     if (!isPlainPlace(target))
         return false;
+    // What is there already stays until the new file is whole, and isn't written to, for it may have other names.
+    FNPath fresh(target);
+    const bool replaces = gFileSystem->fileExists(&target);
+    if (replaces)
+    {
+        fresh.setName(u"extracted");
+        if (!fresh.uniqueName())
+            return false;
+    }
     const IPtr<FStream> content = adopt(openNode(&node));
-    FStream* file = content ? gFileSystem->createFile(&target, kFileWrite, nullptr) : nullptr;
+    FStream* file = content ? gFileSystem->createFile(&fresh, kFileWrite, nullptr) : nullptr;
     if (!file)
         return false;
     // Too many bytes are as wrong as too few: the table is then about something else.
     bool isWhole = copyContent(*content, *file, hook);
     isWhole = isWhole && (node.getReference() || file->tell() == node.getFileSize());
     isWhole = gFileSystem->closeFile(file) && isWhole;
+    if (isWhole && replaces)
+        isWhole = gFileSystem->moveFile(&fresh, &target, false);
     if (!isWhole)
-        gFileSystem->removeFile(&target);
+        gFileSystem->removeFile(&fresh);
     return isWhole;
 }
 

@@ -63,7 +63,12 @@ void FFileArchiveNode::appendChild(FFileArchiveNode* child)
 
 void FFileArchiveNode::sortChildren()
 {
-    std::stable_sort(children.begin(), children.end(), isBefore);
+    sort(children);
+}
+
+void FFileArchiveNode::sort(Children& nodes)
+{
+    std::stable_sort(nodes.begin(), nodes.end(), isBefore);
 }
 
 void FFileArchiveNode::setReference(const FNPath* path)
@@ -97,7 +102,8 @@ void FFileArchiveNode::getPath(FPath& path) const
 {
     std::vector<FString> components;
     for (const FFileArchiveNode* node = this; node->parent; node = node->parent)
-        components.insert(components.begin(), node->getName());
+        components.push_back(node->getName());
+    std::reverse(components.begin(), components.end());
     path.fromString(InnerPath::join(components).text16(), isFolder() ? FPath::kFolder : FPath::kFile);
 }
 

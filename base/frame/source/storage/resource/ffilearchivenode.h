@@ -50,6 +50,7 @@ class FFileArchiveNode : public CmObject
     /// The same for many: the order is wrong until `sortChildren`.
     void appendChild(FFileArchiveNode* child);
     void sortChildren();
+    static void sort(Children& nodes);
 
     // The file outside
     /// A file that stands for the node's own content; null for none. Borrowed.

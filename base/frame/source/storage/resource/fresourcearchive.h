@@ -99,7 +99,7 @@ private:
     // Writing
     bool openToWrite();
     bool addFile(FPath& file, FResourceEntry& entry, FArchiveProgress& progress);
-    bool collect(FPath& folder, FResourceEntry& into);
+    bool collect(FPath& folder, FFileArchiveNode::Children& found);
     bool copyCompressed(FStream& from, FStream& to, FResourceEntry& entry, UProgressHook* hook);
     bool writeContent();
     int chooseVersion() const;

@@ -9,6 +9,16 @@
 
 // Writing new resource files and rebuilding present ones.
 
+namespace
+{
+/// A file that can't be read to its end looks like a short one.
+bool hasFailed(const FStream& source)
+{
+    const FFileStream* onDisk = FCast(FFileStream, static_cast<const FObject*>(&source));
+    return onDisk && onDisk->error();
+}
+} // namespace
+
 // Beginning and giving up
 
 bool FResourceArchive::create(int createFlags, const FUID* compression)
@@ -81,9 +91,13 @@ bool FResourceArchive::create(FPath* folder, short createFlags, UProgressHook* h
 
 bool FResourceArchive::addFolder(FPath* folder, FResourceEntry& into, FArchiveProgress& progress, int depth)
 {
-    if (!folder || depth > kMaxDepth || !collect(*folder, into))
+    FFileArchiveNode::Children added;
+    if (!folder || depth > kMaxDepth || !collect(*folder, added))
         return false;
-    for (const IPtr<FFileArchiveNode>& child : into.getChildren())
+    for (const IPtr<FFileArchiveNode>& child : added)
+        into.appendChild(child);
+    into.sortChildren();
+    for (const IPtr<FFileArchiveNode>& child : added)
     {
         if (progress.wasCanceled())
             return false;
@@ -99,38 +113,35 @@ bool FResourceArchive::addFolder(FPath* folder, FResourceEntry& into, FArchivePr
 }
 
 // Makes entries of what is in the folder, in their order. What is a link or no plain file shows in its size.
-bool FResourceArchive::collect(FPath& folder, FResourceEntry& into)
+bool FResourceArchive::collect(FPath& folder, FFileArchiveNode::Children& found)
 {
     const IPtr<FFileIterator> walk = adopt(gFileSystem->newIterator(&folder, false));
     if (!walk)
         return false;
     for (walk->first(); !walk->done(); walk->next())
     {
-        const IPtr<FPath> found = walk->current();
-        const bool isFolder = found->isFolder();
-        if (path && *found == *path)
+        const IPtr<FPath> place = walk->current();
+        const bool isFolder = place->isFolder();
+        if (path && *place == *path)
             continue;
-        const bool isTaken = ArchiveName::isSafe(found->getName()) &&
-                             ArchiveName::isStorable(found->getName()) &&
-                             (isFolder || gFileSystem->getFileSize(found) >= 0);
+        const bool isTaken = ArchiveName::isSafe(place->getName()) &&
+                             ArchiveName::isStorable(place->getName()) &&
+                             (isFolder || gFileSystem->getFileSize(place) >= 0);
         if (isTaken)
-            into.appendChild(adopt(new FResourceEntry(found->getName(), isFolder ? FResourceEntry::kFolder
-                                                                                 : FResourceEntry::kFile)));
+            found.push_back(adopt(new FResourceEntry(place->getName(), isFolder ? FResourceEntry::kFolder
+                                                                                : FResourceEntry::kFile))
+                                .get());
         else
-            leftOut.push_back(InnerPath::textOf(*found));
+            leftOut.add(InnerPath::textOf(*place));
     }
-    into.sortChildren();
+    FFileArchiveNode::sort(found);
     return true;
 }
 
 bool FResourceArchive::addFile(FPath& file, FResourceEntry& entry, FArchiveProgress& progress)
 {
     const IPtr<FStream> content = adopt(gFileSystem->openFile(&file, kFileRead | kFileShare, nullptr));
-    if (!content || !copyInto(*content, *stream, entry, progress.nextFile(entry.getName())))
-        return false;
-    // A file that can't be read to its end looks like a short one.
-    const FFileStream* onDisk = FCast(FFileStream, static_cast<const FObject*>(content.get()));
-    return !onDisk || !onDisk->error();
+    return content && copyInto(*content, *stream, entry, progress.nextFile(entry.getName()));
 }
 
 bool FResourceArchive::copyInto(FStream& from, FStream& to, FResourceEntry& entry, UProgressHook* hook)
@@ -139,14 +150,14 @@ bool FResourceArchive::copyInto(FStream& from, FStream& to, FResourceEntry& entr
     const int64 sourceStart = from.tell();
     entry.setDataOffset(start);
     if (engine && copyCompressed(from, to, entry, hook))
-        return true;
+        return !hasFailed(from);
     if (hook && hook->wasCanceled())
         return false;
-    from.seek(sourceStart, kSeekStart);
-    if (to.seek(start, kSeekStart) != start || !copyContent(from, to, hook))
+    if (from.seek(sourceStart, kSeekStart) != sourceStart || to.seek(start, kSeekStart) != start ||
+        !copyContent(from, to, hook))
         return false;
     entry.setPlain(to.tell() - start);
-    return true;
+    return !hasFailed(from);
 }
 
 // False also where it would be no smaller.
@@ -220,10 +231,13 @@ bool FResourceArchive::compactFolder(const FFileArchiveNode& from, FResourceArch
 
 bool FResourceArchive::exchange(FNPath& rebuilt)
 {
-    const bool isExchanged = close() && gFileSystem->moveFile(&rebuilt, path, false);
-    if (!isExchanged)
+    // The former file stays open until the other has its name: nothing is lost where that fails.
+    if (!gFileSystem->moveFile(&rebuilt, path, false))
+    {
         gFileSystem->removeFile(&rebuilt);
-    return open() && isExchanged;
+        return false;
+    }
+    return open();
 }
 
 bool FResourceArchive::replaceFileInArchive(FPath* inner, const FNPath* newContent, int createFlags,

@@ -10,22 +10,27 @@
 bool ResourceCheck::run()
 {
     if (!archive.getRoot())
-        problems.push_back(u"the file can't be opened");
+        problems.add(u"the file can't be opened");
     else
         checkFolder(*archive.getRoot());
     if (archive.getDamage() > 0)
-        problems.push_back(u"the table of files is damaged, and some are missing");
+        problems.add(u"the table of files is damaged, and some are missing");
     checkExtents();
-    return problems.empty();
+    return problems.getCount() == 0;
 }
 
 void ResourceCheck::report(const char16* format, const FFileArchiveNode& node)
 {
+    if (problems.isFull())
+    {
+        problems.omit();
+        return;
+    }
     FPath path;
     node.getPath(path);
     FString problem;
     problem.printf(format, InnerPath::textOf(path).text16());
-    problems.push_back(problem);
+    problems.add(problem);
 }
 
 void ResourceCheck::checkFolder(const FFileArchiveNode& folder)

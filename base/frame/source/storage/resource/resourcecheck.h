@@ -1,6 +1,6 @@
 #pragma once
 
-#include "foundation/text/fstring.h"
+#include "storage/resource/boundedtexts.h"
 
 #include <vector>
 
@@ -19,7 +19,7 @@ public:
     /// True where nothing is wrong.
     bool run();
     /// One sentence each.
-    const std::vector<FString>& getProblems() const { return problems; }
+    const BoundedTexts& getProblems() const { return problems; }
     int64 getFileCount() const { return files; }
     int64 getByteCount() const { return bytes; }
 
@@ -40,7 +40,7 @@ private:
     void report(const char16* format, const FFileArchiveNode& node);
 
     FResourceArchive& archive;
-    std::vector<FString> problems;
+    BoundedTexts problems;
     std::vector<Extent> extents;
     int64 files = 0;
     int64 bytes = 0;

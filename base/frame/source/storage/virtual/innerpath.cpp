@@ -3,6 +3,8 @@
 #include "storage/path/fnpath.h"
 #include "storage/url/furl.h"
 
+#include <string>
+
 namespace
 {
 bool isDelimiter(char16 character)
@@ -55,12 +57,13 @@ bool InnerPath::split(const FPath& path, std::vector<FString>& components)
 
 FString InnerPath::join(const std::vector<FString>& components)
 {
-    FString text;
+    // Texts that grow by pieces look for their end each time, and a path of an enemy is long.
+    std::u16string text;
     for (const FString& component : components)
-        text.append(PATH_DELIMITER).append(component);
-    if (text.isEmpty())
-        text.append(PATH_DELIMITER);
-    return text;
+        text.append(1, PATH_DELIMITER).append(component.text16());
+    if (text.empty())
+        text = PATH_DELIMITER;
+    return text.c_str();
 }
 
 IPtr<FPath> InnerPath::childOf(const FPath& folder, const FString& name, int type)
