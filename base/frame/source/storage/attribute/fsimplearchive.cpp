@@ -1,6 +1,8 @@
 #include "storage/attribute/fsimplearchive.h"
 
 #include "storage/attribute/boundedread.h"
+#include "storage/attribute/findex.h"
+#include "storage/attribute/fpointer.h"
 #include "storage/attribute/storedclasses.h"
 #include "storage/stream/fstream.h"
 
@@ -11,12 +13,13 @@ namespace
 constexpr int32 kClassMarker = -1;
 constexpr uint32 kClassBit = 0x80000000;
 /// With the top bit set, the next one would read as a marker.
-constexpr size_t kMaxNumber = 0x7FFFFFFE;
+constexpr int kMaxNumber = 0x7FFFFFFE;
 } // namespace
 
 FSimpleArchive::FSimpleArchive(FStream* archiveStream, bool writing, IArchiveErrorHook* hook)
     : FArchive(archiveStream, writing, hook)
 {
+    written.takeElements();
 }
 
 FSimpleArchive::~FSimpleArchive() = default;
@@ -40,13 +43,13 @@ bool FSimpleArchive::writeObject(const CmObject* object, bool shared)
         return stream->writeInt32(0);
     if (std::find(underWay.begin(), underWay.end(), object) != underWay.end())
         return refuseToWrite();
-    if (const auto found = written.find(object); shared && found != written.end())
-        return stream->writeInt32u(found->second);
+    if (const uint32 number = shared ? numberOf(object) : 0)
+        return stream->writeInt32u(number);
     FArchiveDepthScope scope(depth);
-    if (scope.isTooDeep() || written.size() >= kMaxNumber || !writeClass(object->getClass()))
+    if (scope.isTooDeep() || written.total() >= kMaxNumber || !writeClass(object->getClass()))
         return refuseToWrite();
     if (shared)
-        written.emplace(object, static_cast<uint32>(written.size()) + 1);
+        giveNumber(object);
     underWay.push_back(object);
     const bool isWritten = object->externalize(*this);
     underWay.pop_back();
@@ -55,11 +58,23 @@ bool FSimpleArchive::writeObject(const CmObject* object, bool shared)
 
 bool FSimpleArchive::writeClass(MetaClass* meta)
 {
-    if (const auto found = written.find(meta); found != written.end())
-        return stream->writeInt32u(found->second | kClassBit);
-    written.emplace(meta, static_cast<uint32>(written.size()) + 1);
+    if (const uint32 number = numberOf(meta))
+        return stream->writeInt32u(number | kClassBit);
+    giveNumber(meta);
     return stream->writeInt32(kClassMarker) && stream->writeStr8(meta->persistentName) &&
            stream->writeInt16(meta->classVersion);
+}
+
+uint32 FSimpleArchive::numberOf(const void* address) const
+{
+    const FPointer key(address);
+    const auto* index = static_cast<const FIndex*>(written.lookupObject(&key));
+    return index ? index->getNumber() : 0;
+}
+
+void FSimpleArchive::giveNumber(const void* address)
+{
+    written.add(new FPointer(address), new FIndex(static_cast<uint32>(written.total()) + 1));
 }
 
 bool FSimpleArchive::refuseToWrite()

@@ -1,11 +1,10 @@
 #pragma once
 
-#include "foundation/object/cmobject.h"
+#include "containers/keyed/cmbtreedictionary.h"
 #include "storage/attribute/farchive.h"
 
 #include <cstdint>
 #include <string>
-#include <unordered_map>
 #include <vector>
 
 /// An archive for streams that can't seek, as a connection: it knows objects by numbers instead of positions.
@@ -57,11 +56,15 @@ private:
     CmObject* findRead(uint32 number, const char* className);
     CmObject* refuse();
     bool refuseToWrite();
+    /// 0 for what has none yet.
+    uint32 numberOf(const void* address) const;
+    void giveNumber(const void* address);
     bool isFull() const { return objects.size() + references >= objectLimit; }
 
     int depth = 0;
     // Writing: the numbers given, and the objects whose body is under way.
-    std::unordered_map<const void*, uint32> written;
+    /// FPointer to FIndex.
+    CmBTreeDictionary written;
     std::vector<const CmObject*> underWay;
     // Reading: number 1 comes first.
     std::vector<Entry> entries;
