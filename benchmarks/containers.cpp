@@ -9,6 +9,7 @@
 #include "containers/keyed/cmbtree.h"
 #include "containers/keyed/cmhashdictionary.h"
 #include "containers/sequence/cmarray.h"
+#include "containers/sequence/cmarrayiterator.h"
 #include "foundation/object/iptr.h"
 #include "foundation/text/cmstring.h"
 
@@ -115,8 +116,8 @@ struct OurArray
     int64 sum() const
     {
         int64 result = 0;
-        for (std::unique_ptr<CmIterator> it(array.newIterator()); !it->done();)
-            result += static_cast<Number*>(it->next())->value;
+        for (CmArrayIterator it(array); !it.done();)
+            result += static_cast<Number*>(it.next())->value;
         return result;
     }
 

@@ -1,16 +1,18 @@
 #include "containers/keyed/cmassociation.h"
 
+#include "foundation/object/fastcast.h"
+
 DEFINE_CLASS(CmAssociation, CmObject)
 
 bool CmAssociation::isEqual(const CmObject* other) const
 {
-    const CmAssociation* association = FCast(CmAssociation, other);
+    const CmAssociation* association = FCastLikely(CmAssociation, other);
     return association && key && key->isEqual(association->key);
 }
 
 int CmAssociation::compare(const CmObject* other) const
 {
-    const CmAssociation* association = FCast(CmAssociation, other);
+    const CmAssociation* association = FCastLikely(CmAssociation, other);
     return association && key ? key->compare(association->key) : -1;
 }
 

@@ -128,12 +128,16 @@ CmObject* CmBTree::split(CmBTreeNode* node, CmBTreeNode* right) const
 
 bool CmBTree::remove(CmObject* object)
 {
+    CmObject* removed = takeEqual(object);
+    testDelete(removed);
+    return removed != nullptr;
+}
+
+CmObject* CmBTree::takeEqual(const CmObject* object)
+{
     int index = 0;
     CmBTreeNode* node = nodeSearch(_root, object, index);
-    if (!node)
-        return false;
-    testDelete(detach(node, index));
-    return true;
+    return node ? detach(node, index) : nullptr;
 }
 
 bool CmBTree::remove(const CmIterator& position)
@@ -288,9 +292,10 @@ CmBTreeNode* CmBTree::nodeSearch(CmBTreeNode* root, const CmObject* object, int&
     CmBTreeNode* node = object ? root : nullptr;
     while (node)
     {
-        const int place = node->firstNotBefore(object);
+        bool isEqual = false;
+        const int place = node->firstNotBefore(object, isEqual);
         // Equal elements may stand further to the left, below this one.
-        if (place < node->count && object->compare(node->keys[place]) == 0)
+        if (isEqual)
         {
             found = node;
             index = place;

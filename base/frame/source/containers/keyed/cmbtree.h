@@ -41,6 +41,12 @@ class CmBTree : public CmContainer
     /// As `lookupNode`, below `root`, and the place in the node.
     CmBTreeNode* nodeSearch(CmBTreeNode* root, const CmObject* object, int& index) const;
 
+protected:
+    /// Adds what has no equal here.
+    bool addUnique(CmObject* object) { return !lookupNode(object) && CmBTree::add(object); }
+    /// Takes out the first equal element and gives it, with its reference; null where there is none.
+    CmObject* takeEqual(const CmObject* object);
+
 private:
     friend class CmBTreeIterator;
 

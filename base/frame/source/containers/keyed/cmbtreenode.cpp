@@ -1,18 +1,27 @@
 #include "containers/keyed/cmbtreenode.h"
 
+#include "foundation/object/blockpool.h"
 #include "foundation/object/cmobject.h"
 
-#include <cstdlib>
+#include <cstring>
 #include <new>
+
+namespace
+{
+// One block: the node, its keys, its children.
+size_t blockSize(size_t order)
+{
+    return sizeof(CmBTreeNode) + (2 * order + 1) * sizeof(void*);
+}
+} // namespace
 
 CmBTreeNode* CmBTreeNode::make(int order)
 {
-    // One block: the node, its keys, its children.
     const size_t keyCount = static_cast<size_t>(order);
-    const size_t bytes = sizeof(CmBTreeNode) + (2 * keyCount + 1) * sizeof(void*);
-    void* block = calloc(1, bytes);
+    void* block = BlockPool::take(blockSize(keyCount));
     if (!block)
         return nullptr;
+    memset(block, 0, blockSize(keyCount));
     auto* node = new (block) CmBTreeNode{};
     node->keys = reinterpret_cast<CmObject**>(node + 1);
     node->children = reinterpret_cast<CmBTreeNode**>(node->keys + keyCount);
@@ -21,30 +30,40 @@ CmBTreeNode* CmBTreeNode::make(int order)
 
 void CmBTreeNode::dispose(CmBTreeNode* node)
 {
-    free(node);
+    const auto* keysEnd = reinterpret_cast<CmObject**>(node->children);
+    BlockPool::giveBack(node, blockSize(static_cast<size_t>(keysEnd - node->keys)));
 }
 
 int CmBTreeNode::shouldGo(const CmObject* object) const
-{
-    if (count == 0 || object->compare(keys[0]) < 0)
-        return 0;
-    int place = count;
-    while (place > 1 && object->compare(keys[place - 1]) < 0)
-        place--;
-    return place;
-}
-
-int CmBTreeNode::firstNotBefore(const CmObject* object) const
 {
     int low = 0;
     int high = count;
     while (low < high)
     {
         const int middle = (low + high) / 2;
-        if (object->compare(keys[middle]) > 0)
+        if (object->compare(keys[middle]) < 0)
+            high = middle;
+        else
+            low = middle + 1;
+    }
+    return low;
+}
+
+int CmBTreeNode::firstNotBefore(const CmObject* object, bool& isEqual) const
+{
+    int low = 0;
+    int high = count;
+    while (low < high)
+    {
+        const int middle = (low + high) / 2;
+        const int order = object->compare(keys[middle]);
+        if (order > 0)
             low = middle + 1;
         else
+        {
             high = middle;
+            isEqual = order == 0;
+        }
     }
     return low;
 }

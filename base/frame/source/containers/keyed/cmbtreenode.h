@@ -13,8 +13,8 @@ struct CmBTreeNode
     bool isLeaf() const { return !children[0]; }
     /// The child in whose range `object` falls, behind equal keys.
     int shouldGo(const CmObject* object) const;
-    /// The first key that doesn't sort before `object`; `count` where all do.
-    int firstNotBefore(const CmObject* object) const;
+    /// The first key that doesn't sort before `object`, and whether it sorts with it; `count` where all do.
+    int firstNotBefore(const CmObject* object, bool& isEqual) const;
     /// The index in the parent, which the node must have.
     int indexInParent() const;
     /// Inserts a key with the child to its right, which may be null.

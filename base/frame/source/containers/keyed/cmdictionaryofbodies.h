@@ -23,8 +23,7 @@ template <class Container>
 bool CmDictionaryOf<Container>::add(CmObject* object)
 {
     CmAssociation* association = FCast(CmAssociation, object);
-    if (!association || !association->getKey() || lookupAssoc(association->getKey()) ||
-        !Container::add(object))
+    if (!association || !association->getKey() || !Container::addUnique(object))
         return false;
     if (this->_ownsObjects != CmContainer::kShared)
         association->handOver();
@@ -34,12 +33,12 @@ bool CmDictionaryOf<Container>::add(CmObject* object)
 template <class Container>
 bool CmDictionaryOf<Container>::remove(CmObject* key)
 {
-    CmAssociation* association = lookupAssoc(key);
+    const CmAssociation probe(key);
+    CmObject* association = key ? Container::takeEqual(&probe) : nullptr;
     if (!association)
         return false;
     const Pair pair(association);
-    CmAssociation probe(key);
-    Container::remove(&probe);
+    this->testDelete(association);
     giveUp(pair);
     return true;
 }

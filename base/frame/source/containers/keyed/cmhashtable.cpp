@@ -23,6 +23,13 @@ void append(CmHashBucket& bucket, CmHashNode* node)
     bucket.last = node;
     bucket.count++;
 }
+
+CmHashNode* findEqual(CmHashNode* node, const CmObject* object)
+{
+    while (node && !node->object->isEqual(object))
+        node = node->next;
+    return node;
+}
 } // namespace
 
 CmHashTable::CmHashTable(int size)
@@ -70,9 +77,31 @@ bool CmHashTable::add(CmObject* object)
 {
     if (!object || _size == 0)
         return false;
-    if (_autoResize && _total / _size >= kCrowdedChain && _size <= INT_MAX / kGrowthFactor)
-        resize(_size * kGrowthFactor);
-    append(*bucketOf(object), new CmHashNode{nullptr, object});
+    growIfCrowded();
+    return addTo(*bucketOf(object), object);
+}
+
+bool CmHashTable::addUnique(CmObject* object)
+{
+    if (!object || _size == 0)
+        return false;
+    CmHashBucket* bucket = bucketOf(object);
+    if (findEqual(bucket->first, object))
+        return false;
+    if (growIfCrowded())
+        bucket = bucketOf(object);
+    return addTo(*bucket, object);
+}
+
+bool CmHashTable::growIfCrowded()
+{
+    return _autoResize && _total / _size >= kCrowdedChain && _size <= INT_MAX / kGrowthFactor &&
+           resize(_size * kGrowthFactor);
+}
+
+bool CmHashTable::addTo(CmHashBucket& bucket, CmObject* object)
+{
+    append(bucket, new CmHashNode{nullptr, object});
     _total++;
     testRemember(object);
     return true;
@@ -80,13 +109,21 @@ bool CmHashTable::add(CmObject* object)
 
 bool CmHashTable::remove(CmObject* object)
 {
-    CmHashNode* node = find(object);
-    if (!node)
-        return false;
-    CmObject* removed = node->object;
-    unlink(*bucketOf(object), node);
+    CmObject* removed = takeEqual(object);
     testDelete(removed);
-    return true;
+    return removed != nullptr;
+}
+
+CmObject* CmHashTable::takeEqual(const CmObject* object)
+{
+    if (!object || _size == 0)
+        return nullptr;
+    CmHashBucket& bucket = *bucketOf(object);
+    CmHashNode* predecessor = nullptr;
+    for (CmHashNode* node = bucket.first; node; predecessor = node, node = node->next)
+        if (node->object->isEqual(object))
+            return unlink(bucket, predecessor, node);
+    return nullptr;
 }
 
 bool CmHashTable::remove(const CmIterator& position)
@@ -96,10 +133,11 @@ bool CmHashTable::remove(const CmIterator& position)
     const auto& cursor = static_cast<const CmHashTableIterator&>(position);
     CmHashBucket& bucket = _buckets[cursor.bucket];
     CmHashNode* node = cursor.node;
-    CmObject* removed = node->object;
+    CmHashNode* predecessor = bucket.first == node ? nullptr : bucket.first;
+    while (predecessor && predecessor->next != node)
+        predecessor = predecessor->next;
     cursor.advance();
-    unlink(bucket, node);
-    testDelete(removed);
+    testDelete(unlink(bucket, predecessor, node));
     return true;
 }
 
@@ -116,11 +154,7 @@ void CmHashTable::removeAll()
 {
     for (int i = 0; i < _size; i++)
         while (CmHashNode* node = _buckets[i].first)
-        {
-            CmObject* removed = node->object;
-            unlink(_buckets[i], node);
-            testDelete(removed);
-        }
+            testDelete(unlink(_buckets[i], nullptr, node));
 }
 
 CmObject* CmHashTable::lookup(const CmObject* object) const
@@ -157,10 +191,7 @@ CmHashNode* CmHashTable::find(const CmObject* object) const
 {
     if (!object || _size == 0)
         return nullptr;
-    CmHashNode* node = bucketOf(object)->first;
-    while (node && !node->object->isEqual(object))
-        node = node->next;
-    return node;
+    return findEqual(bucketOf(object)->first, object);
 }
 
 CmHashBucket* CmHashTable::bucketOf(const CmObject* object) const
@@ -174,17 +205,16 @@ unsigned CmHashTable::bucketNumber(const CmObject* object, int size) const
     return _hashFunction ? _hashFunction(object, count) : object->hash(count);
 }
 
-void CmHashTable::unlink(CmHashBucket& bucket, CmHashNode* node)
+CmObject* CmHashTable::unlink(CmHashBucket& bucket, CmHashNode* predecessor, CmHashNode* node)
 {
-    CmHashNode* predecessor = bucket.first == node ? nullptr : bucket.first;
-    while (predecessor && predecessor->next != node)
-        predecessor = predecessor->next;
     (predecessor ? predecessor->next : bucket.first) = node->next;
     if (bucket.last == node)
         bucket.last = predecessor;
     bucket.count--;
     _total--;
+    CmObject* object = node->object;
     delete node;
+    return object;
 }
 
 CmHashTableIterator::CmHashTableIterator(const CmHashTable& walked) : CmIterator(&walked), table(walked)

@@ -6,6 +6,8 @@
 /// A place in a chain of a CmHashTable.
 struct CmHashNode
 {
+    FPOOLED_OBJECTS
+
     CmHashNode* next;
     CmObject* object;
 };
@@ -64,13 +66,21 @@ protected:
     explicit CmHashTable(const SettingsOf& settings);
 
     CmHashNode* find(const CmObject* object) const;
+    /// Adds what has no equal here.
+    bool addUnique(CmObject* object);
+    /// Takes out the first equal element and gives it, with its reference; null where there is none.
+    CmObject* takeEqual(const CmObject* object);
 
 private:
     friend class CmHashTableIterator;
 
     CmHashBucket* bucketOf(const CmObject* object) const;
     unsigned bucketNumber(const CmObject* object, int size) const;
-    void unlink(CmHashBucket& bucket, CmHashNode* node);
+    /// Whether the number of buckets has changed.
+    bool growIfCrowded();
+    bool addTo(CmHashBucket& bucket, CmObject* object);
+    /// `predecessor` is null for the first of a chain. Gives the object, whose reference is then the caller's.
+    CmObject* unlink(CmHashBucket& bucket, CmHashNode* predecessor, CmHashNode* node);
 
     bool _autoResize = false;
     int32 _total = 0;

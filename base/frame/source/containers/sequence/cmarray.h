@@ -16,7 +16,7 @@ class CmArray : public CmArrayBase
     CmArray& operator=(const CmArray& other) { return assign(*this, other); }
     CmArray& operator=(const CmContainer& other) { return assign(*this, other); }
 
-    bool add(CmObject* object) override { return insertAt(_total, object); }
+    bool add(CmObject* object) override;
     using CmArrayBase::remove;
     bool remove(CmObject* object) override { return removeAt(indexAbs(object)); }
 

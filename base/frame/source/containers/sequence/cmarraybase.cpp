@@ -58,7 +58,7 @@ int CmArrayBase::occurrences(const CmObject* object) const
 
 CmIterator* CmArrayBase::newIterator() const
 {
-    return new CmArrayIterator(this, _objects, _total);
+    return new CmArrayIterator(*this);
 }
 
 int CmArrayBase::indexUnder(const CmIterator& position) const
@@ -84,10 +84,8 @@ int CmArrayBase::indexOfIdentical(const CmObject* object) const
     return -1;
 }
 
-bool CmArrayBase::makeRoom()
+bool CmArrayBase::grow()
 {
-    if (_total < _size)
-        return true;
     if (_delta == 0)
         return false;
     int64 newSize = int64{_size} + _delta;

@@ -37,9 +37,14 @@ protected:
     int indexOfEqual(const CmObject* object) const;
     int indexOfIdentical(const CmObject* object) const;
     /// Grows a full array by its step: 0 never, -1 doubles, any other is added. Whether there is a free place.
-    bool makeRoom();
+    bool makeRoom() { return _total < _size || grow(); }
     /// There must be a free place.
     void insert(int index, CmObject* object);
+    void append(CmObject* object)
+    {
+        _objects[_total++] = object;
+        testRemember(object);
+    }
     /// Removes what stands beyond `newSize`, and sets the number of places. False only without memory.
     bool setPlaces(int newSize);
     /// Keeps the elements, so there must be a place for each. False only without memory.
@@ -55,5 +60,8 @@ protected:
     CmObject** _objects = nullptr;
 
 private:
+    friend class CmArrayIterator;
+
+    bool grow();
     CmObject* take(int index);
 };

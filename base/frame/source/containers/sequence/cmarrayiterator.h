@@ -1,16 +1,17 @@
 #pragma once
 
+#include "containers/sequence/cmarraybase.h"
 #include "containers/sequence/cmiterator.h"
 
-/// Walks over the places of a CmArray or CmOrderedArray by index. One thread at a time.
-class CmArrayIterator : public CmIterator
+/// Walks over the places of a CmArray or CmOrderedArray by index. As a local variable it costs no more than counting.
+/// One thread at a time.
+class CmArrayIterator final : public CmIterator
 {
 public:
-    /// `placeHolder` and `totalHolder` are the array's own members, read at each step.
-    CmArrayIterator(const CmContainer* array, CmObject* const* const& placeHolder, const int& totalHolder)
-        : CmIterator(array),
-          places(placeHolder),
-          total(totalHolder)
+    explicit CmArrayIterator(const CmArrayBase& walked)
+        : CmIterator(&walked),
+          places(walked._objects),
+          total(walked._total)
     {
     }
 
@@ -29,6 +30,7 @@ public:
     int index() const { return cursor; }
 
 private:
+    // The array's own members, which may change at each step.
     CmObject* const* const& places;
     const int& total;
     int cursor = 0;

@@ -202,10 +202,11 @@ CmObject* CmContainer::firstThat(CmObjectFilter& filter) const
 
 CmObject* CmContainer::lastThat(CmObjectFilter& filter) const
 {
-    const IteratorHolder it = iterate(*this);
-    for (it->last(); !it->done(); it->previous())
-        if (filter.check(it->current()))
-            return it->current();
+    // Going backwards is slow in a list and in a hash table.
+    const CmArray elements = elementsOf(*this);
+    for (int i = elements.total() - 1; i >= 0; i--)
+        if (filter.check(elements.at(i)))
+            return elements.at(i);
     return nullptr;
 }
 
@@ -215,18 +216,4 @@ bool CmContainer::forEach(CmObjectFilter& filter) const
         if (!filter.check(it->next()))
             return false;
     return true;
-}
-
-// Ownership
-
-void CmContainer::testRemember(CmObject* object) const
-{
-    if (object && _ownsObjects == kRetained)
-        object->addRef();
-}
-
-void CmContainer::testDelete(CmObject* object) const
-{
-    if (object && (_ownsObjects == kTaken || _ownsObjects == kRetained))
-        object->release();
 }

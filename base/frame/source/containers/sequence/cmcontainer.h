@@ -112,9 +112,17 @@ class CmContainer : public CmObject
 
 protected:
     /// Called by every insertion: adds a reference in mode 2.
-    void testRemember(CmObject* object) const;
+    void testRemember(CmObject* object) const
+    {
+        if (object && _ownsObjects == kRetained)
+            object->addRef();
+    }
     /// Called by every removal that doesn't hand the element back: releases it in modes 1 and 2.
-    void testDelete(CmObject* object) const;
+    void testDelete(CmObject* object) const
+    {
+        if (object && (_ownsObjects == kTaken || _ownsObjects == kRetained))
+            object->release();
+    }
     /// What `operator=` of a concrete class does: removes all of `target`, then follows `copy`.
     template <class Container>
     static Container& assign(Container& target, const CmContainer& source);

@@ -5,6 +5,8 @@
 /// A place in a CmDLinkedList.
 struct CmDLinkedNode
 {
+    FPOOLED_OBJECTS
+
     CmDLinkedNode* next;
     CmObject* object;
     CmDLinkedNode* previous;

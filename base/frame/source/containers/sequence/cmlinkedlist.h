@@ -5,6 +5,8 @@
 /// A place in a CmLinkedList.
 struct CmLinkedNode
 {
+    FPOOLED_OBJECTS
+
     CmLinkedNode* next;
     CmObject* object;
 };

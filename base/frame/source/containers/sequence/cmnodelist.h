@@ -29,6 +29,11 @@ public:
     bool removeAt(int index) override;
     void removeAll() override;
     CmObject* at(int index) const override { return objectOf(nodeAt(index)); }
+    CmObject* lookup(const CmObject* object) const override { return objectOf(nodeEqualTo(object)); }
+    bool contains(const CmObject* object) const override { return nodeEqualTo(object) != nullptr; }
+    bool containsAbs(const CmObject* object) const override { return nodeOf(object) != nullptr; }
+    int occurrences(const CmObject* object) const override;
+    int getIndex(const CmObject* object) const override;
     CmIterator* newIterator() const override;
 
     bool append(CmObject* object) { return link(object, _last); }
@@ -64,6 +69,12 @@ protected:
     bool link(CmObject* object, Node* predecessor);
     /// Takes a node out and gives its object, whose reference is then the caller's.
     CmObject* unlink(Node* predecessor, Node* node);
+    /// Adds what has no equal here.
+    bool addUnique(CmObject* object) { return !nodeEqualTo(object) && append(object); }
+    /// Takes out the first equal element and gives it, with its reference; null where there is none.
+    CmObject* takeEqual(const CmObject* object);
+    /// The first one; null where there is none.
+    Node* nodeEqualTo(const CmObject* object) const;
     Node* nodeOf(const CmObject* object) const;
     Node* nodeAt(int index) const;
     Node* before(const Node* node) const { return CmNodeRules<Node>::before(node, _first); }

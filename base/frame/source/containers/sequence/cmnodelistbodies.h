@@ -19,14 +19,48 @@ Node* findBefore(const Node* node, Node* first)
 template <class Node>
 bool CmNodeList<Node>::remove(CmObject* object)
 {
+    CmObject* removed = takeEqual(object);
+    testDelete(removed);
+    return removed != nullptr;
+}
+
+template <class Node>
+CmObject* CmNodeList<Node>::takeEqual(const CmObject* object)
+{
     Node* predecessor = nullptr;
     for (Node* node = _first; object && node; predecessor = node, node = node->next)
         if (objectOf(node)->isEqual(object))
-        {
-            testDelete(unlink(predecessor, node));
-            return true;
-        }
-    return false;
+            return unlink(predecessor, node);
+    return nullptr;
+}
+
+template <class Node>
+Node* CmNodeList<Node>::nodeEqualTo(const CmObject* object) const
+{
+    Node* node = object ? _first : nullptr;
+    while (node && !objectOf(node)->isEqual(object))
+        node = node->next;
+    return node;
+}
+
+template <class Node>
+int CmNodeList<Node>::occurrences(const CmObject* object) const
+{
+    int count = 0;
+    for (Node* node = nodeEqualTo(object); node; node = node->next)
+        if (objectOf(node)->isEqual(object))
+            count++;
+    return count;
+}
+
+template <class Node>
+int CmNodeList<Node>::getIndex(const CmObject* object) const
+{
+    int index = 0;
+    for (Node* node = _first; object && node; node = node->next, index++)
+        if (objectOf(node)->isEqual(object))
+            return index;
+    return -1;
 }
 
 template <class Node>

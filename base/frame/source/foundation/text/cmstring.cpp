@@ -1,19 +1,25 @@
 #include "foundation/text/cmstring.h"
 
+#include "foundation/object/fastcast.h"
 #include "foundation/object/stringhash.h"
+
+#include <cstring>
 
 DEFINE_CLASS(CmString, CmObject)
 
 bool CmString::isEqual(const CmObject* other) const
 {
-    if (const CmString* text = FCast(CmString, other))
-        return FString::compare(*text) == 0;
-    return CmObject::isEqual(other);
+    const CmString* text = FCastLikely(CmString, other);
+    if (!text)
+        return CmObject::isEqual(other);
+    if (isWide && text->isWide && len == text->len)
+        return len == 0 || memcmp(buffer, text->buffer, len * sizeof(char16)) == 0;
+    return FString::compare(*text) == 0;
 }
 
 int CmString::compare(const CmObject* other) const
 {
-    if (const CmString* text = FCast(CmString, other))
+    if (const CmString* text = FCastLikely(CmString, other))
         return FString::compare(*text);
     return CmObject::compare(other);
 }

@@ -174,9 +174,12 @@ int ConstString::compareAt(unsigned index, const ConstString& text, int count, C
         return 0;
     if (text.isEmpty())
         return 1;
+    if (!isWide && !text.isWide)
+        return compareNarrow(chars8() + index, text.chars8(), count, mode);
+    if (isWide && text.isWide)
+        return compareWide(chars16() + index, clampedCount(index, count), text.chars16(),
+                           text.clampedCount(0, count), mode);
     const ConstString rest(*this, static_cast<int>(index));
-    if (!rest.isWide && !text.isWide)
-        return compareNarrow(rest.chars8(), text.chars8(), count, mode);
     const WideText wideRest(rest), wideText(text);
     const ConstString& a = wideRest.get();
     const ConstString& b = wideText.get();
