@@ -9,6 +9,7 @@ namespace
 {
 const char* const kFile = "config/user/name.xml";
 const char* const kTwin = "config/user/name_old.xml";
+const char* const kUnfinished = "config/user/name.xml.new";
 const char* const kBackup = "config/user/name.xml.backup";
 
 class ArchiveFiles : public FileTest
@@ -46,6 +47,8 @@ class Spy : public CmObject
     bool storeAttributes(FAttributes& attributes) const override
     {
         sawTwin = std::filesystem::exists(root + "/" + kTwin);
+        std::ifstream file(root + "/" + kFile, std::ios::binary);
+        sawFile = std::string(std::istreambuf_iterator<char>(file), {});
         attributes.set("x", 1);
         return succeeds;
     }
@@ -53,6 +56,7 @@ class Spy : public CmObject
     std::string root;
     bool succeeds = true;
     mutable bool sawTwin = false;
+    mutable std::string sawFile;
 };
 
 class Answer : public IUserAlert
@@ -80,10 +84,13 @@ TEST_F(ArchiveFiles, ReplaceTheEarlierFileAndLeaveNoTwin)
         "<?xml version=\"1.0\" encoding=\"utf-8\"?>\r<root>\r   <int name=\"n\" value=\"1\"/>\r</root>\r");
     EXPECT_EQ(rightsOf(kFile), 0600) << "what is in the user folder may be secret";
     put(kTwin, "left by a crash");
+    put(kUnfinished, "left by a crash too");
+    const std::string before = contentOf(kFile);
     auto spy = adopt(new Spy(root));
     EXPECT_TRUE(save(2, spy));
     EXPECT_TRUE(spy->sawTwin);
-    EXPECT_FALSE(exists(kTwin));
+    EXPECT_EQ(spy->sawFile, before) << "a crash while saving must not lose the earlier version";
+    EXPECT_FALSE(exists(kTwin) || exists(kUnfinished));
     EXPECT_EQ(load(), 2);
 }
 
@@ -97,7 +104,7 @@ TEST_F(ArchiveFiles, AFailedSaveLeavesTheEarlierFile)
     const std::string before = contentOf(kFile);
     EXPECT_FALSE(save(2, spy));
     EXPECT_EQ(contentOf(kFile), before);
-    EXPECT_FALSE(exists(kTwin));
+    EXPECT_FALSE(exists(kTwin) || exists(kUnfinished));
 }
 
 TEST_F(ArchiveFiles, AFullDiskLeavesTheEarlierFile)

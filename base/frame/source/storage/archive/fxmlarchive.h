@@ -43,12 +43,13 @@ public:
     static bool restoreObjectArchive(const char16* name);
     /// The caller gets a reference; null where there is no such file.
     static FStream* openUserFile(const char16* name);
-    /// Begins a new file, for which an existing one steps aside: `oldPath`, the caller's to release, is null where
-    /// there was none. Every stream, once released, is followed by `finishXmlArchiveWrite`. Null on failure; a file
-    /// that stepped aside is then back in its place.
+    /// Begins a new version, under a name of its own until it is complete. An existing file keeps its name and gets
+    /// a twin: `oldPath`, the caller's to release, is null where there was none. Every stream, once released, is
+    /// followed by `finishXmlArchiveWrite`. Null on failure, with the existing file as it was.
     static FStream* createUserFile(const char16* name, bool askUser, FNPath*& oldPath);
-    /// Removes the earlier file or, without `success`, puts it back. Takes over the reference on `oldPath`.
-    static void finishXmlArchiveWrite(bool success, const char16* name, FNPath* oldPath);
+    /// Puts the new version in the place of the earlier one or, without `success`, removes it; the twin goes. Takes
+    /// over the reference on `oldPath`. Whether the new version is in place.
+    static bool finishXmlArchiveWrite(bool success, const char16* name, FNPath* oldPath);
 
     /// "xml"
     static const FFileType& fileTypeNormal();

@@ -41,16 +41,36 @@ bool mayReplace(const char16* name)
     return answer == kReplaceButton;
 }
 
-/// Gives the file the name of its older twin, whose path the caller gets; null where that failed.
-FNPath* stepAside(const FNPath& path, const char16* name)
+/// Where a new version grows until it is complete; no archive has a name that ends so.
+FNPath getUnfinishedPath(const char16* name)
+{
+    FNPath path = getUserPath(name);
+    FString fileName(path.getName());
+    fileName.append(".new");
+    path.setName(fileName.text16());
+    return path;
+}
+
+/// Gives the file a second name, that of its older twin, whose path the caller gets. A rename would leave a moment
+/// without any file of the first name, and a program that ends in it loses the settings. Null where it failed, as on
+/// a disk without links.
+FNPath* addTwin(FNPath& path, const char16* name)
 {
     FString oldName(name);
     oldName.append("_old");
     auto twin = adopt(new FNPath(getUserPath(oldName.text16())));
     if (gFileSystem->fileExists(twin))
         gFileSystem->removeFile(twin);
-    FNPath renamed(path);
-    return gFileSystem->renameFile(&renamed, twin->getName().text16()) ? twin.take() : nullptr;
+    return gFileSystem->createLink(twin, &path) ? twin.take() : nullptr;
+}
+
+void putBack(FNPath& twin, const FNPath& path)
+{
+    FNPath renamed(twin);
+    const bool isBack = gFileSystem->renameFile(&renamed, path.getName().text16());
+    // Between two names of one file a rename does nothing.
+    if (isBack && gFileSystem->fileExists(&twin))
+        gFileSystem->removeFile(&twin);
 }
 
 bool closeFile(FStream* stream)
@@ -88,28 +108,31 @@ FStream* FXmlArchive::createUserFile(const char16* name, bool askUser, FNPath*& 
     if (isReplacing && askUser && !mayReplace(name))
         return nullptr;
     if (isReplacing)
-        oldPath = stepAside(path, name);
-    FStream* stream = gFileSystem->createFile(&path, kFileWrite, nullptr);
+        oldPath = addTwin(path, name);
+    FNPath unfinished = getUnfinishedPath(name);
+    FStream* stream = gFileSystem->createFile(&unfinished, kFileWrite, nullptr);
     if (!stream)
     {
-        // Without an older twin to put back, what stands there is the earlier file itself.
-        if (oldPath)
-            finishXmlArchiveWrite(false, name, oldPath);
+        finishXmlArchiveWrite(false, name, oldPath);
         oldPath = nullptr;
     }
     return stream;
 }
 
-void FXmlArchive::finishXmlArchiveWrite(bool success, const char16* name, FNPath* oldPath)
+bool FXmlArchive::finishXmlArchiveWrite(bool success, const char16* name, FNPath* oldPath)
 {
     const auto twin = adopt(oldPath);
-    FNPath path = getUserPath(name);
-    if (!success)
-        gFileSystem->removeFile(&path);
-    if (twin && success)
+    const FNPath path = getUserPath(name);
+    FNPath unfinished = getUnfinishedPath(name);
+    // What was written is on the disk by now; the rename puts it in the place of the earlier version in one step.
+    const bool isReplaced = success && gFileSystem->renameFile(&unfinished, path.getName().text16());
+    if (!isReplaced)
+        gFileSystem->removeFile(&unfinished);
+    if (twin && isReplaced)
         gFileSystem->removeFile(twin);
     else if (twin)
-        gFileSystem->renameFile(twin, path.getName().text16());
+        putBack(*twin, path);
+    return isReplaced;
 }
 
 // Trees and objects
@@ -122,8 +145,7 @@ bool FXmlArchive::saveAttributes(const char16* name, const char* rootTag, const 
         return false;
     const bool isWritten = FXmlArchive(file, true).saveAttributes(rootTag, attributes);
     const bool isWhole = closeFile(file) && isWritten;
-    finishXmlArchiveWrite(isWhole, name, oldPath);
-    return isWhole;
+    return finishXmlArchiveWrite(isWhole, name, oldPath);
 }
 
 bool FXmlArchive::storeObject(const char16* name, const char* rootTag, CmObject* object, bool askUser)
@@ -139,8 +161,7 @@ bool FXmlArchive::storeObject(const char16* name, const char* rootTag, CmObject*
         isWritten = archive.save(rootTag);
     }
     const bool isWhole = closeFile(file) && isWritten;
-    finishXmlArchiveWrite(isWhole, name, oldPath);
-    return isWhole;
+    return finishXmlArchiveWrite(isWhole, name, oldPath);
 }
 
 bool FXmlArchive::loadAttributes(const char16* name, const char* rootTag, FAttributes& attributes)
