@@ -1,4 +1,5 @@
 #include "application/iplatformeventhandler.h"
+#include "application/outofmemory.h"
 #include "application/platformservices.h"
 #include "uploadmanager/puploadmanagerapplication.h"
 
@@ -14,6 +15,7 @@ int main(int argc, char** argv)
 {
     Argc = argc;
     Argv = argv;
+    endInWordsWithoutMemory();
     PlatformServices::raiseLimits();
     // The platform's side exists before any other object of the framework.
     IPlatformEventHandler::instance();
