@@ -49,12 +49,14 @@ bool GlibHandOver::meetOthers()
     application = g_application_new(id.c_str(), G_APPLICATION_HANDLES_COMMAND_LINE);
     g_signal_connect(application, "command-line", G_CALLBACK(&GlibHandOver::onCommandLine), this);
     g_signal_connect(application, "activate", G_CALLBACK(&ignoreActivation), nullptr);
-    if (!g_application_register(application, nullptr, nullptr))
-        return false;
-    // A session that ends is no reason to end in the midst of an upload.
-    if (GDBusConnection* bus = g_application_get_dbus_connection(application))
+    // The application takes this very connection while it is held.
+    GDBusConnection* bus = g_bus_get_sync(G_BUS_TYPE_SESSION, nullptr, nullptr);
+    // A bus that goes is no reason to end in the midst of an upload, nor without having begun one.
+    if (bus)
         g_dbus_connection_set_exit_on_close(bus, FALSE);
-    return true;
+    const bool isRegistered = g_application_register(application, nullptr, nullptr);
+    g_clear_object(&bus);
+    return isRegistered;
 }
 
 bool GlibHandOver::handOver(int argc, char** argv)
