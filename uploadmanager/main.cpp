@@ -3,6 +3,12 @@
 #include "application/platformservices.h"
 #include "uploadmanager/puploadmanagerapplication.h"
 
+// Ahead of all objects that are made before main, most of which need memory.
+[[gnu::constructor(101)]] static void beginInWords()
+{
+    endInWordsWithoutMemory();
+}
+
 int AppMain()
 {
     PUploadManagerApplication* application = new PUploadManagerApplication;
@@ -15,7 +21,6 @@ int main(int argc, char** argv)
 {
     Argc = argc;
     Argv = argv;
-    endInWordsWithoutMemory();
     PlatformServices::raiseLimits();
     // The platform's side exists before any other object of the framework.
     IPlatformEventHandler::instance();

@@ -86,7 +86,8 @@ void UploadThread::upload(CURL* curl, CallbackData& data)
     message->addInt("progress", 0);
     gMessenger->postMessage(manager, message, false, 0);
 
-    checkCurlError(curl_easy_perform(curl), data);
+    if (checkCurlError(curl_easy_perform(curl), data) != 0)
+        manager->addTransferError(*data.request);
     if (!data.error.isEmpty())
         manager->requestFailed(data.request);
 }
