@@ -240,8 +240,9 @@ SampleDescription Job::minimal(const std::string& product)
 
 Job::Run Job::start(const Arguments& arguments)
 {
-    Arguments command = arguments;
-    command.insert(command.begin(), program());
+    Arguments command = launcher;
+    command.push_back(program());
+    command.insert(command.end(), arguments.begin(), arguments.end());
     return startWith(std::move(command));
 }
 

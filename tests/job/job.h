@@ -74,6 +74,8 @@ protected:
     }
     /// The answers to the questions of all further starts, such as "1,2".
     void setAnswers(const std::string& answers) { setVariable("VELLAMOOR_ANSWERS", answers); }
+    /// What stands before the program in the command of all further starts by `start`, such as a launcher.
+    Arguments launcher;
 
     // The browser
     /// The lines that the browser wrote, in their order.
