@@ -1,0 +1,160 @@
+#include "tests/faults/faultproxy.h"
+#include "tests/faults/faultrunner.h"
+#include "tests/job/job.h"
+
+namespace
+{
+using Kind = NetworkFault::Kind;
+
+/// The connections of a run: the check of the token, then the upload.
+enum Connection
+{
+    kTokenCheck,
+    kUpload
+};
+
+/// The finished program, the service, and between them a proxy that spoils one connection of each run.
+class Network : public Job
+{
+protected:
+    Network() : proxy(portOf(service->host()))
+    {
+        logIn();
+        useHost(proxy.host());
+        description.configuration({{"GuiMode", "true"}});
+        description.track({{"Path", tone()}});
+    }
+
+    static int portOf(const std::string& host) { return std::stoi(host.substr(host.find(':') + 1)); }
+
+    struct Outcome
+    {
+        std::string printed;
+        bool isHeld = false;
+    };
+
+    void plan(int connection, const NetworkFault& fault)
+    {
+        std::vector<NetworkFault> faults(static_cast<std::size_t>(connection) + 1);
+        faults.back() = fault;
+        proxy.plan(std::move(faults));
+    }
+
+    /// Whether the service has the track as it is on disk, among the requests behind the first `before`.
+    bool isHeld(std::size_t before) const
+    {
+        const std::vector<ReceivedRequest> tracks = received("/tracks");
+        for (std::size_t i = before; i < tracks.size(); i++)
+            if (tracks[i].complete && tracks[i].fields.at(0).sha256 == sha256Of(exports / "tone.wav"))
+                return true;
+        return false;
+    }
+
+    Outcome runWith(int connection, const NetworkFault& fault)
+    {
+        plan(connection, fault);
+        const std::size_t before = received("/tracks").size();
+        Run run = start({writeDescription(description)});
+        if (fault.kind == Kind::stall && proxy.waitForStalled())
+        {
+            EXPECT_TRUE(run.process->isRunning()) << "what stands still is no end";
+            proxy.release();
+        }
+        Outcome result;
+        result.printed = run.finish();
+        result.isHeld = isHeld(before);
+        return result;
+    }
+
+    /// What passes when nothing is wrong.
+    std::vector<FaultProxy::Passed> measure()
+    {
+        const Outcome clean = runWith(kTokenCheck, NetworkFault());
+        EXPECT_TRUE(clean.isHeld) << clean.printed;
+        return proxy.passed();
+    }
+
+    std::string judge(const Outcome& outcome, int connection, const NetworkFault& fault)
+    {
+        const std::string where = std::string(nameOf(fault.kind)) + (fault.isReply ? " of the reply" : "") +
+                                  " at byte " + std::to_string(fault.byte) + " of connection " +
+                                  std::to_string(connection) + ":\n" + outcome.printed;
+        const bool isTold = holds(outcome.printed, "Error Code:") || holds(outcome.printed, "could not be");
+        EXPECT_TRUE(isTold || outcome.isHeld) << "not told, " << where;
+        if (!isTold)
+            return "uploaded";
+        const std::string naming = "The file \"" + tone() + "\" could not be uploaded to SoundCloud.";
+        EXPECT_TRUE(connection == kTokenCheck || holds(outcome.printed, naming)) << "not named, " << where;
+        return outcome.isHeld ? "told, though the service has it" : "told";
+    }
+
+    void sweep(Kind kind, int connection, const FaultProxy::Passed& passed, long most)
+    {
+        Tally tally(std::string("network, ") + nameOf(kind) +
+                    (connection == kUpload ? " in the upload" : " in the token check"));
+        for (const bool isReply : {false, true})
+        {
+            const long count = isReply ? passed.replied : passed.sent;
+            const std::vector<long> points = pointsOf(count, most);
+            for (const long byte : points)
+            {
+                const NetworkFault fault = {kind, isReply, byte - 1};
+                tally.note(judge(runWith(connection, fault), connection, fault));
+            }
+            tally.add(static_cast<long>(points.size()), count);
+        }
+    }
+
+    FaultProxy proxy;
+    SampleDescription description;
+};
+} // namespace
+
+TEST_F(Network, ThatBreaksIsToldWithTheFile)
+{
+    const std::vector<FaultProxy::Passed> passed = measure();
+    ASSERT_EQ(passed.size(), 2u);
+    for (const Kind kind : {Kind::cut, Kind::reset, Kind::half})
+    {
+        sweep(kind, kTokenCheck, passed[kTokenCheck], 2);
+        sweep(kind, kUpload, passed[kUpload], 4);
+    }
+}
+
+TEST_F(Network, ThatIsSlowOrStallsOnlyWaits)
+{
+    const std::vector<FaultProxy::Passed> passed = measure();
+    ASSERT_EQ(passed.size(), 2u);
+    sweep(Kind::stall, kUpload, passed[kUpload], 3);
+    for (const Kind kind : {Kind::delay, Kind::single})
+    {
+        for (const bool isReply : {false, true})
+        {
+            const NetworkFault fault = {kind, isReply, 0};
+            EXPECT_EQ(judge(runWith(kUpload, fault), kUpload, fault), "uploaded");
+        }
+    }
+}
+
+TEST_F(Network, ThatBreaksNamesOnlyTheFileThatItBroke)
+{
+    const std::string second = writeFile("second.wav", "sound");
+    description.track({{"Path", second}});
+    plan(kUpload, {Kind::cut, true, 1});
+    const std::string printed = run({writeDescription(description)});
+    EXPECT_HOLDS(printed, "Internal program error.\nError Code: 10");
+    EXPECT_HOLDS(printed, "The file \"" + tone() + "\" could not be uploaded to SoundCloud.");
+    EXPECT_LACKS(printed, "The file \"" + second + "\" could not be uploaded to SoundCloud.");
+}
+
+TEST_F(Network, ThatStallsForEverEndsWithTheSession)
+{
+    plan(kUpload, {Kind::stall, false, 2000});
+    const std::string file = writeDescription(description);
+    Run run = start({file});
+    ASSERT_TRUE(proxy.waitForStalled());
+    ASSERT_TRUE(run.process->waitForOutput("(1 of 1)"));
+    run.process->terminate();
+    run.finish();
+    EXPECT_TRUE(exists(file)) << "it was not uploaded";
+}
