@@ -17,15 +17,13 @@ enum Connection
 class Network : public Job
 {
 protected:
-    Network() : proxy(portOf(service->host()))
+    Network() : proxy(servicePort())
     {
         logIn();
         useHost(proxy.host());
         description.configuration({{"GuiMode", "true"}});
         description.track({{"Path", tone()}});
     }
-
-    static int portOf(const std::string& host) { return std::stoi(host.substr(host.find(':') + 1)); }
 
     struct Outcome
     {

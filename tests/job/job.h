@@ -41,6 +41,7 @@ protected:
     std::vector<ReceivedRequest> received(const std::string& path) const;
     /// Points the program at a host that answers nothing.
     void useHost(const std::string& host);
+    int servicePort() const { return std::stoi(service->host().substr(service->host().find(':') + 1)); }
     const std::string& token() const { return service->token(); }
 
     // The user's files
