@@ -3,10 +3,9 @@
 #include "storage/stream/fbufferedstream.h"
 #include "storage/stream/uprogresshook.h"
 #include "tests/storage/filefixture.h"
+#include "tests/storage/sizelimit.h"
 
 #include <cerrno>
-#include <csignal>
-#include <sys/resource.h>
 
 namespace
 {
@@ -21,28 +20,6 @@ public:
 
     int64 value = 0;
     bool canceled = false;
-};
-
-/// A limit on the size of files that the process writes, standing in for a full disk.
-class SizeLimit
-{
-public:
-    explicit SizeLimit(rlim_t bytes)
-    {
-        getrlimit(RLIMIT_FSIZE, &former);
-        rlimit limited = {bytes, former.rlim_max};
-        setrlimit(RLIMIT_FSIZE, &limited);
-        formerHandler = std::signal(SIGXFSZ, SIG_IGN);
-    }
-    ~SizeLimit()
-    {
-        setrlimit(RLIMIT_FSIZE, &former);
-        std::signal(SIGXFSZ, formerHandler);
-    }
-
-private:
-    rlimit former = {};
-    void (*formerHandler)(int) = nullptr;
 };
 
 class FFileStreamTest : public FileTest, public testing::WithParamInterface<int>

@@ -236,6 +236,11 @@ TEST_F(ResourceTest, RebuildsInPlace)
     EXPECT_EQ(contentOf("a.qzr"), before);
     EXPECT_EQ(read(*archive, u"b/two"), "another content");
     EXPECT_FALSE(exists("a-01.qzr")) << "nothing is left beside it";
+
+    std::filesystem::create_symlink("a.qzr", root + "/link.qzr");
+    EXPECT_TRUE(opened("link.qzr")->compact(kCompress, nullptr, nullptr));
+    EXPECT_TRUE(std::filesystem::is_symlink(root + "/link.qzr"));
+    EXPECT_EQ(opened("a.qzr")->getVersion(), 3);
 }
 
 TEST_F(ResourceTest, FilesOutsideStandForNodes)

@@ -6,6 +6,7 @@
 #include "storage/stream/uprogresshook.h"
 #include "storage/virtual/farchivemanager.h"
 #include "storage/virtual/fvfilesystem.h"
+#include "tests/storage/sizelimit.h"
 #include "tools/qzr/command.h"
 
 #include <thread>
@@ -74,6 +75,35 @@ TEST_F(ResourceTest, ACancelledPackingLeavesNoFile)
     }
     EXPECT_FALSE(adopt(new FResourceArchive(at("a.qzr"), 0))->create(at("no folder"), 0, nullptr));
     EXPECT_FALSE(exists("a.qzr"));
+}
+
+TEST_F(ResourceTest, AFullDiskLosesNothing)
+{
+    std::string noise;
+    for (uint32 state = 1; noise.size() < 200000; state = state * 1664525 + 1013904223)
+        noise += static_cast<char>(state >> 24);
+    put("src/noise", noise);
+    ASSERT_TRUE(pack("a.qzr", kCompress));
+    const std::string before = contentOf("a.qzr");
+    const IPtr<FResourceArchive> archive = opened("a.qzr");
+    put("out", "kept");
+    FPath noisy(u"noise", FPath::kFile);
+    // The last ones fail in the table and the ending alone.
+    for (const std::size_t limit :
+         {std::size_t{100}, std::size_t{100000}, before.size() - 100, before.size() - 1})
+    {
+        const SizeLimit full(limit);
+        EXPECT_FALSE(pack("b.qzr", kCompress)) << limit;
+        EXPECT_FALSE(archive->compact(kCompress, nullptr, nullptr)) << limit;
+    }
+    {
+        const SizeLimit full(100);
+        EXPECT_FALSE(archive->extractFile(archive->lookupNode(&noisy), *at("out"), nullptr));
+    }
+    EXPECT_EQ(contentOf("out"), "kept");
+    EXPECT_EQ(contentOf("a.qzr"), before);
+    EXPECT_EQ(read(*archive, u"noise"), noise) << "open as before";
+    EXPECT_FALSE(exists("b.qzr") || exists("a-01.qzr") || exists("extracted"));
 }
 
 TEST_F(ResourceTest, LeavesOutWhatIsNoPlainFile)

@@ -74,13 +74,13 @@ FStream* FFileArchive::openHandle(int mode)
 {
     if (!path || !gFileSystem)
         return nullptr;
-    IPtr<FPath> own;
-    {
-        // A path is for one thread at a time, so each opening has its own.
-        FLockScope guard(pathLock);
-        own = copyOf(*path);
-    }
-    return gFileSystem->openFile(own, mode, nullptr);
+    return gFileSystem->openFile(ownCopy(*path), mode, nullptr);
+}
+
+IPtr<FPath> FFileArchive::ownCopy(const FPath& shared) const
+{
+    FLockScope guard(pathLock);
+    return copyOf(shared);
 }
 
 // Content
@@ -102,8 +102,8 @@ FStream* FFileArchive::openNode(const FFileArchiveNode* node)
         return nullptr;
     if (!node->getReference())
         return openSubStream(node);
-    FNPath outside(*node->getReference());
-    return gFileSystem ? gFileSystem->openFile(&outside, kFileRead | kFileShare, nullptr) : nullptr;
+    const IPtr<FPath> outside = ownCopy(*node->getReference());
+    return gFileSystem ? gFileSystem->openFile(outside, kFileRead | kFileShare, nullptr) : nullptr;
 }
 
 FStream* FFileArchive::openSubStream(const FFileArchiveNode* node)
@@ -176,7 +176,7 @@ bool FFileArchive::getFileTimes(FPath* inner, CmTime& created, CmTime& modified)
     const FPath* dated = path;
     if (node && node->getReference())
         dated = node->getReference();
-    return node && dated && gFileSystem && gFileSystem->getFileTimes(copyOf(*dated), created, modified);
+    return node && dated && gFileSystem && gFileSystem->getFileTimes(ownCopy(*dated), created, modified);
 }
 
 int64 FFileArchive::getFileSize(FPath* inner)
@@ -186,8 +186,8 @@ int64 FFileArchive::getFileSize(FPath* inner)
         return -1;
     if (!node->getReference())
         return node->getFileSize();
-    FNPath outside(*node->getReference());
-    return gFileSystem ? gFileSystem->getFileSize(&outside) : -1;
+    const IPtr<FPath> outside = ownCopy(*node->getReference());
+    return gFileSystem ? gFileSystem->getFileSize(outside) : -1;
 }
 
 int64 FFileArchive::getFileSize(FStream* opened)

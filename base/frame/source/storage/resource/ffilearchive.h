@@ -120,6 +120,8 @@ private:
     bool extractContent(const FFileArchiveNode& node, FNPath& target, UProgressHook* hook);
     bool leaveOut(const FFileArchiveNode& node);
     FString archiveName() const;
+    /// A path is for one thread at a time, so each question has its own.
+    IPtr<FPath> ownCopy(const FPath& shared) const;
 
-    FLock pathLock{"path of an archive"};
+    mutable FLock pathLock{"paths of an archive"};
 };

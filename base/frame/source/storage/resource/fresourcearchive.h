@@ -109,7 +109,7 @@ private:
     void writeNumber(FStream& table, int64 number) const;
     void fillId(ResourceFileEnding& ending) const;
     void abandon();
-    bool exchange(FNPath& rebuilt);
+    bool exchange(FNPath& rebuilt, FNPath& former);
 
     IPtr<FCompressionEngine> engine;
     float quality = kDefaultQuality;

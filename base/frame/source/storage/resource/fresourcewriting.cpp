@@ -185,7 +185,11 @@ bool FResourceArchive::compact(int createFlags, const FUID* compression, UProgre
     const IPtr<FNPath> native = FNFileSystem::getNativePathFromPath(path);
     if (!native || !gFileSystem || !root || isWriting || hasOpenStreams() || damage > 0)
         return false;
-    FNPath place(*native);
+    // The file is replaced where it is, and not a link to it.
+    FNPath goal(*native);
+    if (!gFileSystem->checkResolveLink(&goal))
+        return false;
+    FNPath place(goal);
     if (!place.uniqueName())
         return false;
     uint64 bytes = 0;
@@ -201,7 +205,7 @@ bool FResourceArchive::compact(int createFlags, const FUID* compression, UProgre
         rebuilt->abandon();
         return false;
     }
-    return exchange(place);
+    return exchange(place, goal);
 }
 
 bool FResourceArchive::compactFolder(const FFileArchiveNode& from, FResourceArchive& target,
@@ -229,10 +233,10 @@ bool FResourceArchive::compactFolder(const FFileArchiveNode& from, FResourceArch
     return true;
 }
 
-bool FResourceArchive::exchange(FNPath& rebuilt)
+bool FResourceArchive::exchange(FNPath& rebuilt, FNPath& former)
 {
     // The former file stays open until the other has its name: nothing is lost where that fails.
-    if (!gFileSystem->moveFile(&rebuilt, path, false))
+    if (!gFileSystem->moveFile(&rebuilt, &former, false))
     {
         gFileSystem->removeFile(&rebuilt);
         return false;
