@@ -206,3 +206,19 @@ TEST(CmDictionary, FindsTheFirstKeyOfAnObject)
     EXPECT_EQ(dictionary.lookupKey(&nine), nullptr);
     EXPECT_EQ(dictionary.lookupKey(nullptr), nullptr);
 }
+
+TEST(CmHashDictionary, GrowsForNewKeysAlone)
+{
+    CmHashDictionary dictionary(10);
+    dictionary.setAutoResize(true);
+    fill(dictionary, 20);
+    Item present(7), object(1), added(20);
+    EXPECT_FALSE(dictionary.add(&present, &object));
+    EXPECT_EQ(dictionary.size(), 10) << "a refused pair must not change the order";
+    dictionary.shareElements();
+    EXPECT_TRUE(dictionary.add(&added, &object));
+    EXPECT_EQ(dictionary.size(), 100);
+    EXPECT_EQ(dictionary.lookup(&added), &object);
+    EXPECT_TRUE(dictionary.remove(&added));
+    dictionary.takeElements();
+}
