@@ -80,14 +80,13 @@ bool takeCharacter(const Byte*& in, const Byte* end, char16*& out)
 template <class Element>
 unsigned countAscii(const Element* text)
 {
-    constexpr uint64 kAbove = sizeof(Element) == 1 ? 0x8080808080808080 : 0xFF80FF80FF80FF80;
     constexpr unsigned kTogether = sizeof(uint64) / sizeof(Element);
     constexpr unsigned kBitsPerElement = 8 * sizeof(Element);
     for (unsigned i = 0; i < kBlock; i += kTogether)
     {
         uint64 word = 0;
         memcpy(&word, text + i, sizeof(word));
-        word &= kAbove;
+        word &= kAboveAscii<Element>;
         if (word == 0)
             continue;
         const int bits =
