@@ -2,6 +2,7 @@
 #include "foundation/message/fmessage.h"
 #include "foundation/message/fmessenger.h"
 #include "foundation/thread/flockscope.h"
+#include "network/http/tlssession.h"
 #include "uploadmanager/puploadmanagerapplication.h"
 #include "uploadmanager/uploadrequest.h"
 #include "uploadmanager/uploadtexts.h"
@@ -101,7 +102,8 @@ bool PUploadManagerApplication::checkInitializeCurl()
 {
     if (curlInitialized)
         return true;
-    curlInitialized = curl_global_init(CURL_GLOBAL_ALL) == CURLE_OK;
+    // libcurl does not look whether the library of its encryption is there, and runs into it.
+    curlInitialized = curl_global_init(CURL_GLOBAL_ALL) == CURLE_OK && TlsSession::isAvailable();
     if (!curlInitialized)
         fatalError(kFatalCurlGlobal);
     return curlInitialized;

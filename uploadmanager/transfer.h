@@ -16,6 +16,8 @@ int checkCurlError(CURLcode code, CallbackData& data);
 void setVerification(CURL* curl, CallbackData& data);
 /// The reply goes to `libcurl_write_callback` with `data`.
 void setReplyCallback(CURL* curl, CallbackData& data);
+/// `data` is told the socket of each new connection.
+void noteSocket(CURL* curl, CallbackData& data);
 
 /// Takes a chunk of a reply; `data` is a CallbackData or null. Each chunk is read by itself as one XML document.
 /// Always gives the whole size, so that no reply breaks a transfer.

@@ -50,6 +50,7 @@ void UploadThread::prepare(CURL* curl, CallbackData& data)
     checkCurlError(curl_easy_setopt(curl, CURLOPT_PROGRESSDATA, &data), data);
     setVerification(curl, data);
     setReplyCallback(curl, data);
+    noteSocket(curl, data);
 }
 
 // The judgement on a reply is not taken back between the requests of a run: once one has failed, all behind it count

@@ -122,6 +122,24 @@ TEST_F(Failure, OfAFileThatIsGoneByThenIsTold)
     EXPECT_EQ(received("/tracks").size(), 1u);
 }
 
+TEST_F(Failure, OfAFileThatBecomesShorterMeanwhileIsTold)
+{
+    constexpr std::uintmax_t kSize = 32 << 20;
+    const std::string audio = writeFile("shrinking.wav", "");
+    std::filesystem::resize_file(audio, kSize);
+    SampleDescription description;
+    description.track({{"Path", audio}});
+    service->plan("/tracks stall 100000");
+    Run run = start({writeDescription(description)});
+    ASSERT_TRUE(service->waitForStalled(1, kHangs));
+    std::filesystem::resize_file(audio, kSize / 8);
+    service->release();
+
+    const std::string printed = run.finish();
+    EXPECT_HOLDS(printed, couldNotUpload(audio));
+    EXPECT_HOLDS(printed, kRetry);
+}
+
 TEST_F(Failure, OfTheConnectionEndsTheRunWithItsNumber)
 {
     const std::string large = writeFile("large.wav", std::string(8 << 20, 'a'));

@@ -129,6 +129,11 @@ private:
 };
 } // namespace
 
+bool TlsSession::isAvailable()
+{
+    return OPENSSL_init_ssl(0, nullptr) == 1 && OSSL_LIB_CTX_get0_global_default();
+}
+
 std::unique_ptr<TlsSession> TlsSession::start(TlsTransport& transport, const FString& host,
                                               const FString& certificateFile)
 {

@@ -4,7 +4,9 @@
 #include <climits>
 #include <cstdlib>
 
+#include <linux/sockios.h>
 #include <pwd.h>
+#include <sys/ioctl.h>
 #include <sys/resource.h>
 #include <sys/stat.h>
 #include <unistd.h>
@@ -57,6 +59,12 @@ bool isOwnFolder(const std::string& path)
            (info.st_mode & (S_IWGRP | S_IWOTH)) == 0;
 }
 } // namespace
+
+int PlatformServices::unsentBytes(int socket)
+{
+    int count = 0;
+    return ioctl(socket, SIOCOUTQ, &count) == 0 ? count : -1;
+}
 
 void PlatformServices::raiseLimits()
 {

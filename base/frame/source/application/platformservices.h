@@ -20,6 +20,9 @@ std::string getTemporaryFolder(const std::string& name);
 /// Makes the folder and what leads to it, for the owner only; whether it is there afterwards.
 bool makePrivateFolder(const std::string& path);
 
+/// How many bytes given to the socket the other side has not taken yet; -1 where that can't be told. Any thread.
+int unsentBytes(int socket);
+
 /// Hands a URL to the desktop's handler for its scheme. Any thread.
 void openURL(const std::string& url);
 } // namespace PlatformServices

@@ -24,6 +24,10 @@ class TlsSession
 public:
     virtual ~TlsSession() = default;
 
+    /// Whether the library of the platform could be set up. Where memory was short for that, it can't be used by
+    /// anybody in this process.
+    static bool isAvailable();
+
     /// Greets the server, and trusts it only if its certificate is for `host`, holds today, and goes back to one of
     /// those in the file `certificateFile` (PEM). Null where it isn't to be trusted or the transport fails, which is
     /// borrowed and outlives the session.
