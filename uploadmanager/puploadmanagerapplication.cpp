@@ -23,7 +23,6 @@ PUploadManagerApplication::PUploadManagerApplication()
     applications.setOwnership(CmContainer::kTaken);
     uploadErrors.setOwnership(CmContainer::kTaken);
     generalErrors.setOwnership(CmContainer::kTaken);
-    transferErrors.setOwnership(CmContainer::kTaken);
     requests.retainElements();
     finishedRequests.retainElements();
     failedRequests.retainElements();
@@ -87,7 +86,6 @@ void PUploadManagerApplication::quit()
     endProgress();
     checkDeleteXmlFile();
     addTokenFileWarning();
-    addWarnings(transferErrors);
     setModalAlertActive(true);
     popupWarningList(nullptr);
     setModalAlertActive(false);

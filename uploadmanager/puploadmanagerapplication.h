@@ -60,8 +60,6 @@ class PUploadManagerApplication : public UApplication
     bool fatalError(int code);
     void addUploadError(const char16* text);
     void addGeneralError(const char16* text);
-    /// Names the file of a transfer that broke; the fatal error of it is a number. Shown at the end.
-    void addTransferError(UploadRequest& request);
     /// Two or three general errors on a value of `parameter` that can't be used; `fallback`, if any, stays in force.
     void addParameterWarning(UploadRequest* request, FString parameter, const char16* fallback);
 
@@ -180,7 +178,6 @@ private:
     std::atomic<bool> ending{false};
     /// A login or logout could not be stored, which the user is told at the end.
     bool tokenFileFailed = false;
-    CmArray transferErrors{0, 10};
     /// What the translator was told; it keeps the pointer.
     FString storedLanguage;
 };

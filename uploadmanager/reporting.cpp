@@ -38,15 +38,6 @@ void PUploadManagerApplication::addGeneralError(const char16* text)
     generalErrors.add(new CmString(text));
 }
 
-// The fatal error of a transfer is a number; which file it befell stands in the list behind it.
-void PUploadManagerApplication::addTransferError(UploadRequest& request)
-{
-    FString text;
-    text.printf(strUploadFailedForFile.text(), getPathText(&request.path).text16());
-    FLockScope guard(errorLock);
-    transferErrors.add(new CmString(text));
-}
-
 void PUploadManagerApplication::addParameterWarning(UploadRequest* request, FString parameter,
                                                     const char16* fallback)
 {

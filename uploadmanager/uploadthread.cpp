@@ -87,8 +87,7 @@ void UploadThread::upload(CURL* curl, CallbackData& data)
     message->addInt("progress", 0);
     gMessenger->postMessage(manager, message, false, 0);
 
-    if (checkCurlError(curl_easy_perform(curl), data) != 0)
-        manager->addTransferError(*data.request);
+    checkCurlError(curl_easy_perform(curl), data);
     if (!data.error.isEmpty())
         manager->requestFailed(data.request);
 }
