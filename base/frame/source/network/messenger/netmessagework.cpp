@@ -3,7 +3,6 @@
 #include "network/messenger/imicrosecondstimer.h"
 #include "network/messenger/netmessageform.h"
 #include "network/messenger/nmessenger.h"
-#include "storage/stream/fmemorystream.h"
 #include "storage/url/furlhandler.h"
 
 NetMessageWork::NetMessageWork(NMessenger& owner, const FUrl& target, const IPtr<FMemoryStream>& messageBytes)

@@ -2,11 +2,11 @@
 
 #include "foundation/object/iptr.h"
 #include "foundation/thread/fworkclass.h"
+#include "storage/stream/fmemorystream.h"
 #include "storage/url/furl.h"
 
 #include <atomic>
 
-class FMemoryStream;
 class NMessenger;
 
 /// Sends one message to one program. The messenger is borrowed. The bytes of the message are held, and are never
