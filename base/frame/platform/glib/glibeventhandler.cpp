@@ -175,10 +175,17 @@ void GlibEventHandler::releaseApplication()
 
 void GlibEventHandler::onTimer()
 {
-    if (!gController)
-        return;
+    // An event loop within a pulse turns the timer too: it must not start a pulse from the middle of another.
+    const bool wasInPulse = std::exchange(inPulse, true);
+    if (gController && !wasInPulse)
+        pulse();
+    inPulse = wasInPulse;
+}
+
+void GlibEventHandler::pulse()
+{
     gController->onIdle(false);
-    if (gController->isFlushEnabled())
+    if (gController && gController->isFlushEnabled())
         doUpdates();
 }
 

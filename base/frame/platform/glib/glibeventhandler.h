@@ -59,6 +59,7 @@ private:
     };
 
     void onTimer() override;
+    void pulse();
     bool takesArguments() override;
     void receiveArgument(const std::string& argument, const std::string& folder) override;
     void collectArguments(const std::vector<std::string>& arguments);
@@ -76,4 +77,5 @@ private:
     // Held while the loop runs: whoever ends it is one of the application's own operations.
     IPtr<UApplication> runningApplication;
     bool isRunning = false;
+    bool inPulse = false;
 };
