@@ -6,6 +6,8 @@
 #include "storage/stream/fmemorystream.h"
 #include "tests/storage/filefixture.h"
 
+#include <string>
+
 namespace
 {
 struct Row
@@ -65,6 +67,17 @@ TEST(FNPath, FailedAscentLeavesARelativePathAsItWas)
         EXPECT_EQ(partsOf(path), before);
         EXPECT_TRUE(path.isFile());
     }
+}
+
+TEST(FNPath, AscendsPastDoubledDelimitersAndKeepsThemAbove)
+{
+    FNPath path(u"//a///b//c", FPath::kFile);
+    EXPECT_TRUE(path.ascend());
+    EXPECT_EQ(partsOf(path), "//a///|b");
+    EXPECT_TRUE(path.ascend());
+    EXPECT_EQ(partsOf(path), "//|a");
+    EXPECT_FALSE(path.ascend()) << "no folder is left to go to";
+    EXPECT_EQ(partsOf(path), "//|a");
 }
 
 TEST(FNPath, DescendsIntoItself)
@@ -185,6 +198,24 @@ TEST(FNPath, MakesRelativePathsAbsolute)
     EXPECT_TRUE(relative.isLink());
     EXPECT_EQ(utf8(relative.getKnownFileType().getName()), "Alphabet");
     EXPECT_FALSE(relative.makeAbsolute(&base)) << "it is by now";
+}
+
+TEST(FNPath, FollowsAWayOverManyLevels)
+{
+    constexpr int kLevels = 100000;
+    std::u16string up, down;
+    for (int i = 0; i < kLevels; i++)
+        up += u"../", down += u"/a";
+    const FNPath relative((up + u"b/c").c_str(), FPath::kFile);
+    EXPECT_EQ(relative.countAscendLevels(), kLevels);
+    for (const auto& [base, result] :
+         {std::pair(u"/x/y" + down, "/x/y/b/c"), std::pair(u"/x" + down.substr(4), "/b/c"),
+          std::pair(u"x" + down, "x/a/b/c")})
+    {
+        const FNPath folder(base.c_str(), FPath::kFolder);
+        const IPtr<FNPath> place = adopt(relative.createAbsolutePath(&folder));
+        EXPECT_EQ(fullPathOf(*place), result);
+    }
 }
 
 TEST(FNPath, WritesItselfAsAUrl)

@@ -16,9 +16,9 @@ constexpr char16 kForeignDelimiter = PATH_DELIMITER == kUnixDelimiter ? kWindows
 constexpr char16 kUpwards[] = {u'.', u'.', PATH_DELIMITER, 0};
 constexpr unsigned kUpwardsLength = 3;
 
-bool startsUpwards(const FString& text)
+bool leadsUpwards(const FString& text, unsigned index)
 {
-    return text.compare(kUpwards, static_cast<int>(kUpwardsLength)) == 0;
+    return text.compareAt(index, kUpwards, static_cast<int>(kUpwardsLength)) == 0;
 }
 
 bool isLetter(char16 c)
@@ -230,9 +230,10 @@ FNPath* FNPath::createAbsolutePath(const FNPath* base) const
         return nullptr;
     FNPath* result = new FNPath(*base);
     result->fileType = fileType;
-    FString folders(path);
-    for (; startsUpwards(folders); folders.remove(0, static_cast<int>(kUpwardsLength)))
-        result->ascend();
+    const int levels = countAscendLevels();
+    for (int i = 0; i < levels && result->ascend(); i++)
+    {
+    }
     if (name == ConstString(u"."))
         return result;
     if (name == ConstString(u".."))
@@ -240,7 +241,7 @@ FNPath* FNPath::createAbsolutePath(const FNPath* base) const
         result->ascend();
         return result;
     }
-    descendBy(*result, folders);
+    descendBy(*result, FString(ConstString(path, levels * static_cast<int>(kUpwardsLength))));
     result->descend(name.text16(), type);
     return result;
 }
@@ -257,7 +258,7 @@ bool FNPath::makeAbsolute(const FNPath* base)
 int FNPath::countAscendLevels() const
 {
     int levels = 0;
-    for (FString rest(path); startsUpwards(rest); rest.remove(0, static_cast<int>(kUpwardsLength)))
+    while (leadsUpwards(path, static_cast<unsigned>(levels) * kUpwardsLength))
         levels++;
     return levels;
 }

@@ -237,16 +237,16 @@ bool FPath::ascend()
         return ascendFromRoot();
     if (path.isEmpty())
         return false;
-    FString folder(path);
-    while (endsInDelimiter(folder))
-        folder.remove(folder.length() - 1);
-    const int last = folder.findPrev(-1, PATH_DELIMITER);
+    // In place: whoever goes up many levels would copy the path as often.
+    int end = static_cast<int>(path.length());
+    while (end > 0 && path.testChar16(static_cast<unsigned>(end) - 1, PATH_DELIMITER))
+        end--;
+    const int last = end > 0 ? path.findPrev(end - 1, PATH_DELIMITER) : -1;
     if (last < 0)
         return false;
     name.assign(u"");
-    folder.extract(name, static_cast<unsigned>(last) + 1);
-    folder.remove(static_cast<unsigned>(last) + 1);
-    path.take(folder);
+    path.extract(name, static_cast<unsigned>(last) + 1, end - last - 1);
+    path.remove(static_cast<unsigned>(last) + 1);
     type = kFolder;
     return true;
 }
