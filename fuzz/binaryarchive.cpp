@@ -1,3 +1,4 @@
+#include "fuzz/driver/options.h"
 #include "fuzz/fuzztree.h"
 #include "storage/archive/fbinarchive.h"
 
@@ -28,7 +29,6 @@ void loadRoots(const std::string& bytes)
     FMemoryStream stream(const_cast<char*>(bytes.data()), static_cast<int64>(bytes.size()));
     FBinArchive archive(&stream, false);
     archive.load();
-    const LeaksAllowed allowed;
     for (const char* name : {"a", "b"})
     {
         archive.getRoot(name, "FAttributes");
@@ -39,6 +39,7 @@ void loadRoots(const std::string& bytes)
 
 extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size)
 {
+    const LeaksAllowed allowed(data, size);
     FuzzText input(data, size);
     const uint8_t choice = input.takeByte();
     const size_t begin = std::min<size_t>(size, 1);

@@ -1,6 +1,5 @@
 #pragma once
 
-#include "fuzz/driver/options.h"
 #include "fuzz/fuzztext.h"
 #include "storage/attribute/fattributes.h"
 #include "storage/attribute/fxmlobject.h"
@@ -15,7 +14,6 @@ inline std::string bytesOf(FMemoryStream& stream)
 /// Asks for every object of a tree, which makes it, and looks into sub-trees.
 inline void touchObjects(FAttributes& tree, int depth = 0)
 {
-    const LeaksAllowed allowed;
     for (int i = 0; depth < FArchive::kMaxDepth && i < tree.total(); i++)
     {
         const std::string key = tree.entryAt(i)->getKey();

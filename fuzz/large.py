@@ -144,6 +144,7 @@ def path():
     for name, piece in (('delimiters', '/'), ('here', './'), ('up', '../'), ('folders', 'a/'), ('colons', ':'),
                         ('foreign', '\\'), ('dots', '.'), ('marks', 'a\u0308')):
         yield name, repeat('/', piece, prefix=b'\0')
+    yield 'away', b'\0' + b'../' * (SIZE // 6) + b'\0' + b'/a' * (SIZE // 4)
     yield 'two', b'\0' + b'/a' * (SIZE // 4) + b'\0' + b'/b' * (SIZE // 4)
 
 

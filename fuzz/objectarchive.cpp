@@ -1,5 +1,6 @@
 #include "foundation/object/cmobject.h"
 #include "foundation/object/iptr.h"
+#include "fuzz/driver/options.h"
 #include "fuzz/fuzztree.h"
 #include "storage/attribute/fnewarchive.h"
 #include "storage/attribute/fsimplearchive.h"
@@ -46,7 +47,7 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size)
 {
     if (size == 0)
         return 0;
-    const LeaksAllowed allowed;
+    const LeaksAllowed allowed(data, size);
     const bool isSimple = data[0] % 2 == 1;
     const Objects objects =
         isSimple ? read<FSimpleArchive>(data + 1, size - 1) : read<FNewArchive>(data + 1, size - 1);
@@ -55,6 +56,10 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size)
         FAttributes tree;
         object->storeAttributes(tree);
         object->hash(7);
+        object->isEqual(object);
+        const auto copy = adopt(object->newCopy());
+        object->isEqual(copy);
+        object->compare(copy);
     }
     isSimple ? writeAgain<FSimpleArchive>(objects) : writeAgain<FNewArchive>(objects);
     return 0;

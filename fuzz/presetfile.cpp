@@ -1,3 +1,4 @@
+#include "fuzz/driver/options.h"
 #include "fuzz/presetwalk.h"
 
 #include "services/presets/presetfiles.h"
@@ -8,6 +9,7 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size)
     auto stream = adopt(new FMemoryStream);
     stream->writeRaw(data, static_cast<int64>(size));
     stream->rewind();
+    const LeaksAllowed allowed(data, size);
     FXmlArchive archive(stream, false);
     if (!archive.load(PresetFiles::kRootTag))
         return 0;

@@ -1,3 +1,4 @@
+#include "fuzz/driver/options.h"
 #include "fuzz/fuzztree.h"
 #include "storage/archive/fxmlarchive.h"
 
@@ -29,7 +30,6 @@ void loadRoots(const std::string& text, bool windowsEntities)
     FMemoryStream stream(const_cast<char*>(text.data()), static_cast<int64>(text.size()));
     FXmlArchive archive(&stream, false);
     archive.load(kRoot, nullptr, windowsEntities);
-    const LeaksAllowed allowed;
     for (const char* name : {"a", "b"})
     {
         archive.getRoot(name, "FAttributes");
@@ -40,6 +40,7 @@ void loadRoots(const std::string& text, bool windowsEntities)
 
 extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size)
 {
+    const LeaksAllowed allowed(data, size);
     FuzzText input(data, size);
     const uint8_t choice = input.takeByte();
     const size_t begin = std::min<size_t>(size, 1);
