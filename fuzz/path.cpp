@@ -6,7 +6,7 @@
 
 namespace
 {
-constexpr int kMaxSteps = 100;
+constexpr int kMaxSteps = 20;
 
 /// The full path is always the folder part followed by the name, which holds no delimiter.
 void checkParts(const FPath& path)

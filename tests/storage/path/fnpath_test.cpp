@@ -187,7 +187,8 @@ TEST(FNPath, MakesRelativePathsAbsolute)
     for (const auto& [text, result] :
          {std::pair(u".", "/a/x"), std::pair(u"..", "/a"), std::pair(u"../..", "/"),
           std::pair(u"../../../../b", "/b"), std::pair(u"y/.", "/a/x"), std::pair(u"y/..", "/a"),
-          std::pair(u"y/z/w", "/a/x/y/z/w")})
+          std::pair(u"y/z/w", "/a/x/y/z/w"), std::pair(u"y//z///w", "/a/x/y/z/w"),
+          std::pair(u"..//y", "/a/y")})
     {
         const IPtr<FNPath> place = adopt(FNPath(text, FPath::kFile).createAbsolutePath(&base));
         EXPECT_EQ(fullPathOf(*place), result) << utf8(text);

@@ -33,18 +33,18 @@ void raiseDriveLetter(String& text)
         text.toUpper(0u);
 }
 
-// Descends by each component of a folder part.
-void descendBy(FNPath& path, const FString& folders)
+/// What a folder part holds from `index` on, without empty components.
+std::u16string foldersOf(const FString& path, int index)
 {
-    int begin = 0;
-    for (int end = folders.findNext(begin, PATH_DELIMITER); end >= 0;
-         end = folders.findNext(begin, PATH_DELIMITER))
+    std::u16string folders;
+    const int end = path.findPrev(-1, PATH_DELIMITER);
+    for (; index <= end; index++)
     {
-        FString component;
-        if (end > begin && folders.extract(component, static_cast<unsigned>(begin), end - begin))
-            path.descend(component.text16(), FPath::kFolder);
-        begin = end + 1;
+        const char16 character = path.getChar16(static_cast<unsigned>(index));
+        if (character != PATH_DELIMITER || (!folders.empty() && folders.back() != PATH_DELIMITER))
+            folders += character;
     }
+    return folders;
 }
 
 bool isPlainInUrl(char c)
@@ -241,7 +241,9 @@ FNPath* FNPath::createAbsolutePath(const FNPath* base) const
         result->ascend();
         return result;
     }
-    descendBy(*result, FString(ConstString(path, levels * static_cast<int>(kUpwardsLength))));
+    // All folders at once: a path that grew by each of them would be copied as often.
+    result->descend(u"", kFolder);
+    result->path.append(foldersOf(path, levels * static_cast<int>(kUpwardsLength)).c_str());
     result->descend(name.text16(), type);
     return result;
 }
