@@ -28,6 +28,19 @@ TEST(String, AssignsWholeAndPartTexts)
     EXPECT_EQ(shape(text.assign(static_cast<const char16*>(nullptr))), "wide:");
 }
 
+TEST(String, IsFilledAgainInItsBlock)
+{
+    String text(u"wide");
+    EXPECT_EQ(shape(text.refill("abcdefghijklmnopqrstuvwxyz!", 26)), "narrow:abcdefghijklmnopqrstuvwxyz");
+    const void* block = text.text();
+    EXPECT_EQ(shape(text.refill("abc", 2)), "narrow:ab");
+    EXPECT_EQ(shape(text.refill("ABCDEFGHIJKLMNOPQRSTUVWXYZ", 26)), "narrow:ABCDEFGHIJKLMNOPQRSTUVWXYZ");
+    EXPECT_EQ(text.text(), block);
+    EXPECT_EQ(shape(text.append("+")), "narrow:ABCDEFGHIJKLMNOPQRSTUVWXYZ+");
+    EXPECT_EQ(shape(text.refill("", 0)), "narrow:");
+    EXPECT_EQ(text.text(), nullptr);
+}
+
 TEST(String, SurvivesBeingItsOwnSource)
 {
     String text("abcdef");

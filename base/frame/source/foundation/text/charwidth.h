@@ -58,3 +58,6 @@ bool isAsciiText(const Char* text, unsigned length)
 
 /// One byte of the default encoding in 16 bits; a blank where it means nothing alone.
 char16 widenCharacter(char character);
+
+/// The bytes that a block from `malloc` has, which may be more than were asked for; 0 for null. From the platform.
+size_t blockSizeOf(const void* block);

@@ -49,6 +49,9 @@ public:
     String& assign(const ConstString& text, int count = -1);
     String& assign(char character, int count = 1);
     String& assign(char16 character, int count = 1);
+    /// Gives it `count` narrow characters, none of which is zero or its own. The block stays where it is large enough:
+    /// for a text that is filled again and again.
+    String& refill(const char* text, unsigned count);
     String& append(const char* text, int count = -1);
     String& append(const char16* text, int count = -1);
     String& append(const ConstString& text, int count = -1);

@@ -288,6 +288,18 @@ String& String::assign(char16 character, int count)
     return assignRun(character, count);
 }
 
+String& String::refill(const char* text, unsigned count)
+{
+    const bool fits = count > 0 && count < blockSizeOf(buffer);
+    if (!fits && (!resize(count, false) || count == 0))
+        return *this;
+    std::memcpy(buffer, text, count);
+    isWide = 0;
+    len = count & kMaxTextLength;
+    terminate(count);
+    return *this;
+}
+
 String& String::append(const char* text, int count)
 {
     return insertAt(len, text, count, true);
