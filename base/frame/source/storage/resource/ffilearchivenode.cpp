@@ -100,11 +100,13 @@ int64 FFileArchiveNode::countFiles(bool recursive, bool foldersToo, uint64* byte
 
 void FFileArchiveNode::getPath(FPath& path) const
 {
-    std::vector<FString> components;
+    std::vector<const FFileArchiveNode*> way;
     for (const FFileArchiveNode* node = this; node->parent; node = node->parent)
-        components.push_back(node->getName());
-    std::reverse(components.begin(), components.end());
-    path.fromString(InnerPath::join(components).text16(), isFolder() ? FPath::kFolder : FPath::kFile);
+        way.push_back(node);
+    std::u16string text;
+    for (auto node = way.rbegin(); node != way.rend(); ++node)
+        text.append(1, PATH_DELIMITER).append((*node)->getName().text16());
+    path.fromString(way.empty() ? u"/" : text.c_str(), isFolder() ? FPath::kFolder : FPath::kFile);
 }
 
 void FFileArchiveNode::dump(FConsole* console, int level) const

@@ -21,8 +21,8 @@ class FResourceArchive : public FFileArchive
         kCompressContent = 2
     };
 
-    /// Deeper folders are neither written nor read: they would exhaust the stack.
-    static constexpr int kMaxDepth = 1000;
+    /// Deeper folders are neither written nor read: they would exhaust the stack, and each path would be long.
+    static constexpr int kMaxDepth = 128;
     static constexpr float kDefaultQuality = 0.6f;
 
     using FFileArchive::FFileArchive;

@@ -4,6 +4,7 @@
 #include "storage/url/furl.h"
 
 #include <string>
+#include <string_view>
 
 namespace
 {
@@ -12,13 +13,13 @@ bool isDelimiter(char16 character)
     return character == kUnixDelimiter || character == kWindowsDelimiter;
 }
 
-bool step(const FString& component, std::vector<FString>& components)
+bool step(std::u16string_view component, std::vector<FString>& components)
 {
-    if (component.isEmpty() || component == ConstString("."))
+    if (component.empty() || component == u".")
         return true;
-    if (!(component == ConstString("..")))
+    if (component != u"..")
     {
-        components.push_back(component);
+        components.emplace_back(component.data(), static_cast<int>(component.size()), false);
         return true;
     }
     if (components.empty())
@@ -40,15 +41,13 @@ bool InnerPath::split(const FPath& path, std::vector<FString>& components)
 {
     components.clear();
     const FString text = textOf(path);
-    for (unsigned begin = 0; begin <= text.length();)
+    const std::u16string_view characters(text.text16(), text.length());
+    for (std::size_t begin = 0; begin <= characters.size();)
     {
-        unsigned end = begin;
-        while (end < text.length() && !isDelimiter(text.getChar16(end)))
+        std::size_t end = begin;
+        while (end < characters.size() && !isDelimiter(characters[end]))
             end++;
-        FString component;
-        if (end > begin)
-            text.extract(component, begin, static_cast<int>(end - begin));
-        if (!step(component, components))
+        if (!step(characters.substr(begin, end - begin), components))
             return false;
         begin = end + 1;
     }
