@@ -6,6 +6,7 @@ FOLDER gets a folder for each target. scripts/fuzz --large runs the targets over
 import pathlib
 import struct
 import sys
+import zlib
 
 SIZE = 1 << 20
 
@@ -163,10 +164,152 @@ def numbers():
     yield 'one', repeat('', '1', 'e')
 
 
+def datagrams():
+    for name, piece in (('blanks', ' '), ('coded', '%20'), ('words', 'a 1 '), ('digits', '1')):
+        yield name, repeat('pock...pock...VELLAMOOR ', piece)
+
+
+def deflate():
+    def packed(how, content):
+        return bytes([how]) + zlib.compress(content, 9)
+    yield 'small', b'\2' + b'\x78\xda' + b'\0\0\0\xff\xff' * (SIZE // 5 - 1)
+    yield 'bomb', packed(0, bytes(1 << 26))
+    yield 'bombsmall', packed(2, bytes(1 << 26))
+    yield 'zeros', b'\xff' + bytes(SIZE - 1)
+    yield 'mixed', b'\xfd' + b''.join(struct.pack('<I', i * 2654435761 & 0xffffffff) for i in range(SIZE // 4 - 1))
+    yield 'repeated', b'\xff' + (b'a' * 257 + b'b') * (SIZE // 258)
+
+
+def http_reply():
+    begin = '0HTTP/1.1 200 OK\r\n'
+    yield 'lines', repeat(begin, 'a: b\r\n', '\r\n')
+    yield 'names', count(begin, 'a#: b\r\n', '\r\n')
+    for name, piece in (('long', 'a'), ('blanks', ' '), ('folded', '\r\n a')):
+        yield name, repeat(begin + 'a: ', piece, '\r\n\r\n')
+    yield 'returns', repeat('0', '\r', '\n')
+    yield 'ends', repeat('0', '\n')
+    yield 'continued', repeat('0', 'HTTP/1.1 100 Continue\r\n\r\n', 'HTTP/1.1 200 OK\r\n\r\n')
+    yield 'chunks', repeat(begin + 'Transfer-Encoding: chunked\r\n\r\n', '1\r\na\r\n', '0\r\n\r\n')
+    yield 'chunkdigits', repeat(begin + 'Transfer-Encoding: chunked\r\n\r\n', '0', '1\r\na\r\n')
+    yield 'body', repeat(begin + '\r\n', 'a')
+    yield 'redirected', repeat('0', 'HTTP/1.1 301 x\r\nLocation: /a\r\n\r\n\x1e', '')
+    yield 'farredirected', repeat('0HTTP/1.1 301 x\r\nLocation: http://h/', '%41/', '\r\n\r\n\x1eHTTP/1.1 200 OK\r\n\r\n')
+    for name, piece in (('asked', 'Basic realm="a", '), ('quoted', '"\\"')):
+        yield name, repeat('0HTTP/1.1 401 x\r\nWWW-Authenticate: ', piece, '\r\n\r\n\x1eHTTP/1.1 200 OK\r\n\r\n')
+
+
+def net_messages():
+    def text(value):
+        return struct.pack('<i', len(value) + 1) + value + b'\0'
+
+    def message(values, number):
+        return text(b'inbox') + struct.pack('<i', 0) + text(b'kinds') + struct.pack('<i', number) + values
+    integer = b''.join(text(b'%x' % -i) + struct.pack('<hq', 1, 1) for i in range(-SIZE // 20, 0))
+    yield 'values', message(integer, SIZE // 20)
+    yield 'same', message((text(b'a') + struct.pack('<hq', 1, 1)) * (SIZE // 16 - 4), SIZE // 16 - 4)
+    first = text(b'l') + struct.pack('<hi', 18, -1) + text(b'CmArray') + struct.pack('<hhi', 0, 2, 60000)
+    string = struct.pack('<i', -1) + text(b'CmString') + struct.pack('<h', 0) + text(b'a')
+    yield 'many', message(first + string + (struct.pack('<I', 0x80000003) + text(b'a')) * 59999, 1)
+    yield 'shared', message(first + string + struct.pack('<i', 4) * 59999, 1)
+    tree = struct.pack('<i', -1) + text(b'FAttributes') + struct.pack('<hi', 0, SIZE // 17)
+    yield 'tree', message(text(b't') + struct.pack('<h', 18) + tree + integer, 1)
+
+
+def older_presets():
+    def text(value, mark=b'\xef\xbb\xbf'):
+        return struct.pack('<i', len(value) + 1 + len(mark)) + value + b'\0' + mark
+
+    def known(name):
+        return text(name, b'') + struct.pack('<h', 0)
+    start = struct.pack('<ii', 1, -2) + known(b'FPresetItem') + struct.pack('<i', -2) + known(b'CmObject') + \
+        struct.pack('<i', -1) + known(b'FPresetList')
+    string = struct.pack('<i', -1) + known(b'CmString') + struct.pack('<i', 8) + text(b'')
+    first = struct.pack('<i', -1) + known(b'FPreset')
+    body = text(b'One') + string + struct.pack('<i', 3)
+    first += struct.pack('<i', len(body)) + body
+    names = text(b'id') + text(b'Name')
+    at = len(start) + 4 + len(names) + 4
+    class_of_string = at + first.index(b'\xff\xff\xff\xff', 4)
+    again_body = text(b'One') + struct.pack('<Ii', 0x80000000 + class_of_string, 8) + text(b'') + struct.pack('<i', 3)
+    again = struct.pack('<Ii', 0x80000000 + at, len(again_body)) + again_body
+    number = (SIZE - at - len(first)) // len(again)
+    items = names + struct.pack('<i', number + 1) + first + again * number
+    yield 'presets', start + struct.pack('<i', len(items)) + items
+    yield 'huge', start + struct.pack('<i', SIZE) + names + struct.pack('<i', 0x7fffffff) + first + again * number
+    level = 0x80000000 + start.index(b'\xff\xff\xff\xff')
+    nested = struct.pack('<Ii', level, SIZE) + names + struct.pack('<i', 1)
+    yield 'nested', start + struct.pack('<i', SIZE) + names + struct.pack('<i', 1) + nested * (SIZE // len(nested) - 4)
+
+
+def preset_file():
+    begin = '<?xml version="1.0" encoding="utf-8"?><Presets><rootObjects><root name="Pool" ID="1"/></rootObjects>' \
+            '<obj class="FPresetPool" name="Pool" ID="1"><list name="Lists" type="list">'
+    item = '<item><string name="ID" value="#"/><list name="Items" type="obj">'
+    yield 'lists', count(begin, item + '</list></item>', '</list></obj></Presets>')
+    body = begin + item + ''.join(f'<item value="{i + 2}"/>' for i in range(11000)) + '</list></item></list></obj>'
+    preset = '<obj class="FPreset" ID="%d"><string name="Name" value="a"/></obj>'
+    yield 'presets', (body + ''.join(preset % (i + 2) for i in range(11000)) + '</Presets>').encode()
+    same = begin + item + '<item value="2"/>' * 50000 + '</list></item></list></obj>'
+    yield 'same', (same + preset % 2 + '</Presets>').encode()
+    chain = '<obj class="FPresetList" ID="%d"><string name="ID" value="a"/><list name="Items" type="obj">' \
+            '<item value="%d"/><item value="%d"/></list></obj>'
+    inner = ''.join(chain % (i, i + 1, i + 1) for i in range(2, 6500))
+    yield 'chain', (begin + item + '<item value="2"/></list></item></list></obj>' + inner + '</Presets>').encode()
+
+
+def resource_file():
+    def file(entries, number, content=b''):
+        ending = struct.pack('<iii', len(entries), number, 16) + b'QZRF'
+        return b'Vellamoor Resource File\r\n' + content + entries + ending
+
+    def entry(name, kind=2, offset=0, size=0):
+        return struct.pack('<iii', kind, offset, size) + name + b'\0'
+    number = SIZE // 20
+    yield 'files', file(b''.join(entry(b'%x' % i) for i in range(number)), number)
+    yield 'falling', file(b''.join(entry(b'%x' % (0xfffff - i)) for i in range(number)), number)
+    yield 'same', file(entry(b'a') * (SIZE // 15), SIZE // 15)
+    yield 'long', file(b''.join(entry(b'a' * 240 + b'%x' % i) for i in range(4000)), 4000)
+    for name, depth in (('deep', 127), ('deeper', 30000)):
+        folders = entry(b'a', 1) * depth + entry(b'..', 1) * depth
+        times = SIZE // len(folders) or 1
+        yield name, file(folders * times, 2 * depth * times)
+    inside = entry(b'a', 1) * 127 + b''.join(entry(b'%x' % i) for i in range(60000)) + entry(b'..', 1) * 127
+    yield 'deepfiles', file(inside, 60254)
+    full = b''.join(entry(b'%x' % i, 2, 25 + i, 1) for i in range(50000))
+    yield 'content', file(full, 50000, bytes(50000))
+    yield 'overlapping', file(b''.join(entry(b'%x' % i, 2, 25, 200000) for i in range(40000)), 40000, bytes(200000))
+
+
+def stream():
+    for name, start, piece in (('writes', '\0\0\2', '\x3e\0'), ('reads', '\0\0\2', '\x3d\0'),
+                               ('far', '\0\0\2', '\0\2\x0f\xff\x02\0')):
+        yield name, repeat(start, piece)
+
+
+def string_match():
+    yield 'similar', repeat('a' * 500 + '\0', 'b', '')
+    yield 'part', repeat('a' * 1000 + 'b\0', 'a', '')
+    yield 'whole', b'a' * (SIZE // 2 - 1) + b'\0' + b'A' * (SIZE // 2 - 1)
+    yield 'thousand', b'ab' * 500 + b'\0' + b'ba' * 500
+
+
+def tokens():
+    for name, piece in (('delimiters', ','), ('tokens', 'a,'), ('one', 'a')):
+        yield name, repeat('1234567890123456789,\0,\0', piece)
+
+
+def wildcard():
+    for name, piece in (('stars', '*a'), ('marks', '?'), ('escapes', '\\\\'), ('letters', 'a')):
+        yield name, b'\0' + piece.encode() * (2000 // len(piece)) + b'\0' + b'a' * 2000
+
+
 TARGETS = {'xmlparser': xml_parser, 'xmlentities': entities, 'document': document, 'xmlarchive': xml_archive,
            'binaryarchive': binary_archive, 'objectarchive': object_archive, 'exportdescription': description,
            'translation': translation, 'redirect': redirect, 'reply': reply, 'path': path, 'url': url,
-           'numbers': numbers}
+           'numbers': numbers, 'datagrams': datagrams, 'deflate': deflate, 'httpreply': http_reply,
+           'netmessages': net_messages, 'olderpresets': older_presets, 'presetfile': preset_file,
+           'resourcefile': resource_file, 'stream': stream, 'stringmatch': string_match, 'tokens': tokens,
+           'wildcard': wildcard}
 
 
 def main():
