@@ -243,6 +243,20 @@ TEST_F(ResourceTest, RebuildsInPlace)
     EXPECT_EQ(opened("a.qzr")->getVersion(), 3);
 }
 
+TEST_F(ResourceTest, RebuiltKeepsItsRights)
+{
+    using std::filesystem::perms;
+    ASSERT_TRUE(pack("a.qzr"));
+    const perms owner = perms::owner_read | perms::owner_write;
+    for (const perms rights :
+         {owner, owner | perms::group_read, owner | perms::group_read | perms::others_read})
+    {
+        std::filesystem::permissions(root + "/a.qzr", rights);
+        ASSERT_TRUE(opened("a.qzr")->compact(0, nullptr, nullptr));
+        EXPECT_EQ(std::filesystem::status(root + "/a.qzr").permissions(), rights);
+    }
+}
+
 TEST_F(ResourceTest, FilesOutsideStandForNodes)
 {
     ASSERT_TRUE(pack("a.qzr"));

@@ -183,13 +183,21 @@ bool PlatformFiles::isSame(const std::string& left, const std::string& right)
            leftFacts.st_dev == rightFacts.st_dev && leftFacts.st_ino == rightFacts.st_ino;
 }
 
+int PlatformFiles::copyRights(const std::string& from, const std::string& to)
+{
+    struct stat facts = {};
+    if (stat(from.c_str(), &facts) != 0)
+        return errno;
+    return resultOf(chmod(to.c_str(), facts.st_mode & 0777));
+}
+
 int PlatformFiles::copyAttributes(const std::string& from, const std::string& to)
 {
     struct stat facts = {};
     if (stat(from.c_str(), &facts) != 0)
         return errno;
     const timespec times[] = {facts.st_atim, facts.st_mtim};
-    if (const int error = resultOf(chmod(to.c_str(), facts.st_mode & 0777)))
+    if (const int error = copyRights(from, to))
         return error;
     return resultOf(utimensat(AT_FDCWD, to.c_str(), times, 0));
 }

@@ -263,6 +263,14 @@ bool FNFileSystem::enableWrite(FPath* path, bool state)
     return native && PlatformFiles::setWritable(DiskName::find(*native), state) == 0;
 }
 
+bool FNFileSystem::copyRights(FPath* from, FPath* to)
+{
+    const IPtr<FNPath> source = getNativePathFromPath(from);
+    const IPtr<FNPath> target = getNativePathFromPath(to);
+    return source && target &&
+           PlatformFiles::copyRights(DiskName::find(*source), DiskName::find(*target)) == 0;
+}
+
 bool FNFileSystem::isHidden(FPath* path)
 {
     return path && (path->getName().testChar16(0, u'.') || !path->isVisible());

@@ -104,6 +104,8 @@ class FNFileSystem : public FFileSystem
     static void makeFileSizeString(double bytes, FString& result, int unit);
     bool canWrite(FPath* path);
     bool enableWrite(FPath* path, bool state);
+    /// Gives `to` the rights of `from`: who may read and write it.
+    bool copyRights(FPath* from, FPath* to);
     bool isHidden(FPath* path);
     bool isBitwiseCopyable(FPath*) override { return true; }
     /// Files have no type besides their name and content here: always false.

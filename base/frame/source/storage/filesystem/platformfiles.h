@@ -93,7 +93,9 @@ int setWritable(const std::string& path, bool state);
 bool isExecutable(const std::string& path);
 /// Whether both paths lead to the same thing on disk.
 bool isSame(const std::string& left, const std::string& right);
-/// Gives `to` the rights of `from` and the time of its last change.
+/// Gives `to` the rights of `from`.
+int copyRights(const std::string& from, const std::string& to);
+/// The same, and the time of its last change.
 int copyAttributes(const std::string& from, const std::string& to);
 
 // Volumes

@@ -63,8 +63,8 @@ class FResourceArchive : public FFileArchive
     /// size. False where it was cancelled or can't be written.
     bool copyInto(FStream& from, FStream& to, FResourceEntry& entry, UProgressHook* hook);
 
-    // Rebuilding: a new file beside this one takes its place once it is whole. Not while a stream of the archive is
-    // open, nor when it is damaged, for what is left out would be lost. On failure all is as it was.
+    // Rebuilding: a new file beside this one, with its rights, takes its place once it is whole. Not while a stream of the
+    // archive is open, nor when it is damaged, for what is left out would be lost. On failure all is as it was.
     /// Files that stand for nodes become the nodes' content.
     bool compact(int createFlags, const FUID* compression, UProgressHook* hook);
     /// Writes the content of a folder into another archive that is being written.

@@ -199,7 +199,9 @@ bool FResourceArchive::compact(int createFlags, const FUID* compression, UProgre
     rebuilt->quality = quality;
     if (!rebuilt->create(createFlags, compression))
         return false;
-    if (!compactFolder(*root, *rebuilt, static_cast<FResourceEntry&>(*rebuilt->root), progress) ||
+    // Before any content is in it: nobody else may read that meanwhile.
+    if (!gFileSystem->copyRights(&goal, &place) ||
+        !compactFolder(*root, *rebuilt, static_cast<FResourceEntry&>(*rebuilt->root), progress) ||
         !rebuilt->close())
     {
         rebuilt->abandon();
