@@ -148,7 +148,7 @@ private:
 
     void logOut(const FString& url);
     void storeToken(const FString& productName, const FString& token);
-    void saveTokens(const FAttributes& tokens);
+    void saveTokens(const FAttributes& tokens, bool isUnreadable);
     void addTokenFileWarning();
     void fatalRedirectError(int code);
     bool openWaitingDescription();

@@ -175,19 +175,21 @@ bool PUploadManagerApplication::checkScLoginData(FPath* url, CmDictionary& dicti
     return false;
 }
 
-// Other products' tokens in the file stay; a file that can't be read is begun anew.
+// Other products' tokens in the file stay; a damaged file is begun anew.
 void PUploadManagerApplication::storeToken(const FString& productName, const FString& token)
 {
     FAttributes tokens;
-    FXmlArchive::loadAttributes(kTokenFile, kTokenRoot, tokens);
+    bool isUnreadable = false;
+    FXmlArchive::loadAttributes(kTokenFile, kTokenRoot, tokens, &isUnreadable);
     tokens.set(FString(productName).text8(), token, true);
-    saveTokens(tokens);
+    saveTokens(tokens, isUnreadable);
 }
 
-// The old file stays whole. A login holds for this run all the same; a logout has not happened.
-void PUploadManagerApplication::saveTokens(const FAttributes& tokens)
+// A file that could not be read may hold more than these tokens, and is left alone. Where nothing is saved, the old file
+// stays whole: a login holds for this run all the same; a logout has not happened.
+void PUploadManagerApplication::saveTokens(const FAttributes& tokens, bool isUnreadable)
 {
-    if (!FXmlArchive::saveAttributes(kTokenFile, kTokenRoot, tokens))
+    if (isUnreadable || !FXmlArchive::saveAttributes(kTokenFile, kTokenRoot, tokens))
         tokenFileFailed = true;
 }
 
@@ -256,7 +258,8 @@ void PUploadManagerApplication::fatalRedirectError(int code)
 void PUploadManagerApplication::logOut(const FString& url)
 {
     FAttributes tokens;
-    if (!FXmlArchive::loadAttributes(kTokenFile, kTokenRoot, tokens))
+    bool isUnreadable = false;
+    if (!FXmlArchive::loadAttributes(kTokenFile, kTokenRoot, tokens, &isUnreadable) && !isUnreadable)
         return;
     FString name(kDefaultLogoutProduct);
     for (int i = 0; i < applications.total(); i++)
@@ -268,7 +271,7 @@ void PUploadManagerApplication::logOut(const FString& url)
         break;
     }
     tokens.setString8(name.text8(), "", true);
-    saveTokens(tokens);
+    saveTokens(tokens, isUnreadable);
 }
 
 bool PUploadManagerApplication::openWaitingDescription()

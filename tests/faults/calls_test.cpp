@@ -202,7 +202,7 @@ protected:
     void expectNextStart(const std::string& where)
     {
         const std::size_t before = received("/tracks").size();
-        const bool hasToken = exists(userFile("scat"));
+        const bool hasToken = contentsOf(userFile("scat")).find("Loomrit") != std::string::npos;
         const std::string printed = run({freshDescription()});
         EXPECT_LACKS(printed, "Error Code:") << where;
         EXPECT_EQ(received("/tracks").size() - before, hasToken ? 1u : 0u) << where << ":\n" << printed;
@@ -229,11 +229,20 @@ class LoggingIn : public Calling
 protected:
     Arguments prepare() override
     {
+        writeUserFile("scat", otherTokens());
         writeUserFile(kCache, attributeFile("VellamoorUploadManagerCache",
                                             {{"latest request file", freshDescription()}}, true));
         return {"vlmr://loomrit/successfullLogin?code=1#access_token=" + token()};
     }
-    std::set<std::string> tokenFiles() const override { return {"", knownTokens()}; }
+    std::set<std::string> tokenFiles() const override
+    {
+        return {otherTokens(),
+                attributeFile("scat", {{"Loomrit", base64(token())}, {"Plenar", base64("other")}})};
+    }
+
+private:
+    /// Which no login of another product may lose.
+    static std::string otherTokens() { return attributeFile("scat", {{"Plenar", base64("other")}}); }
 };
 } // namespace
 

@@ -258,13 +258,15 @@ std::string openFile(pid_t thread, int descriptor)
     return procOf(thread, "/fd/") + std::to_string(descriptor);
 }
 
-/// Whether the descriptor leads to a file below the watched folder.
+/// Whether the descriptor leads to the watched folder or a file below it.
 bool isWatched(pid_t thread, int descriptor)
 {
     char path[4096];
     const ssize_t length = readlink(openFile(thread, descriptor).c_str(), path, sizeof path - 1);
-    return !options.folder.empty() && length > 0 &&
-           std::string(path, static_cast<std::size_t>(length)).starts_with(options.folder + "/");
+    if (options.folder.empty() || length <= 0)
+        return false;
+    const std::string_view found(path, static_cast<std::size_t>(length));
+    return found == options.folder || found.starts_with(options.folder + "/");
 }
 
 /// Whether the call is one on an event counter and the like, which are no files: the kernel never refuses them.
@@ -293,10 +295,10 @@ bool isChange(pid_t thread, const seccomp_data& call)
     return isOneOf(kNameChanges, call.nr) || opensForChange(call);
 }
 
-void noteWritten(pid_t thread, int descriptor, bool isDirty)
+void noteState(const std::string& path, bool isDirty)
 {
     struct stat facts = {};
-    if (!isWatched(thread, descriptor) || stat(openFile(thread, descriptor).c_str(), &facts) != 0)
+    if (stat(path.c_str(), &facts) != 0)
         return;
     const int count = shared->fileCount;
     int at = 0;
@@ -312,10 +314,12 @@ void noteWritten(pid_t thread, int descriptor, bool isDirty)
 void noteChange(pid_t thread, const seccomp_data& call)
 {
     const int descriptor = static_cast<int>(call.args[0]);
-    if (call.nr == SYS_write || call.nr == SYS_writev || call.nr == SYS_pwrite64)
-        noteWritten(thread, descriptor, true);
-    else if (call.nr == SYS_fsync || call.nr == SYS_fdatasync)
-        noteWritten(thread, descriptor, false);
+    const bool isWrite = call.nr == SYS_write || call.nr == SYS_writev || call.nr == SYS_pwrite64;
+    const bool isSync = call.nr == SYS_fsync || call.nr == SYS_fdatasync;
+    if ((isWrite || isSync) && isWatched(thread, descriptor))
+        noteState(openFile(thread, descriptor), isWrite);
+    else if (isOneOf(kNameChanges, call.nr) || opensForChange(call))
+        noteState(options.folder, true);
 }
 
 /// Counts the call for one kind. True where it is the one that is meant.

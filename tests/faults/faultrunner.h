@@ -33,7 +33,7 @@ struct FaultReport
 {
     std::map<std::string, long> counts;
     bool isReached = false;
-    /// The files in the watched folder that were written and not synced.
+    /// The files in the watched folder that were written and not synced, and the folder itself where its names were.
     std::vector<unsigned long> unsynced;
 
     long countOf(FaultKind kind) const { return countOf(std::string(kFaultKindNames[kind])); }

@@ -126,6 +126,7 @@ protected:
         const std::string oldBytes = isReplacing ? bytesOf(subject, kOld) : "";
         put(subject, oldBytes);
         ASSERT_EQ(run(Fault(), "save", subject, kNew), kDone);
+        EXPECT_TRUE(report.unsynced.empty()) << subject.file << " is told as saved and may still be lost";
         const long count = report.countOf(kChangeCalls);
         ASSERT_GT(count, 2);
         for (long number = 1; number <= count; number++)

@@ -270,6 +270,29 @@ TEST_F(BadUserFile, OnAFullDiskLeavesTheOldOneWhole)
         EXPECT_EQ(entry.path().filename(), "scat.xml");
 }
 
+TEST_F(BadUserFile, ThatCannotBeReadIsLeftAlone)
+{
+    // Opens as a file, and gives an error instead of its first byte.
+    fs::create_directories(userFolder);
+    fs::create_symlink("/proc/self/mem", userFile("scat"));
+    EXPECT_EQ(run({"vlmr://loomrit/successfullLogin?access_token=" + token()}), errorCode(5));
+    EXPECT_EQ(run({"vlmr://logout/Loomrit"}), errorCode(5)) << "nobody was logged out";
+    EXPECT_TRUE(fs::is_symlink(userFile("scat"))) << "it may hold other products' tokens";
+
+    fs::remove(userFile("scat"));
+    fs::create_directory(userFile("scat"));
+    EXPECT_EQ(run({"vlmr://loomrit/successfullLogin?access_token=" + token()}), errorCode(5));
+    EXPECT_TRUE(fs::is_directory(userFile("scat")));
+}
+
+TEST_F(BadUserFile, ThatIsDamagedIsBegunAnewByALogin)
+{
+    const std::string good = attributeFile("scat", {{"Plenar", base64("other")}});
+    writeUserFile("scat", good.substr(0, good.size() - 4));
+    EXPECT_EQ(run({"vlmr://loomrit/successfullLogin?access_token=" + token()}), "");
+    EXPECT_EQ(contentsOf(userFile("scat")), attributeFile("scat", {{"Loomrit", base64(token())}}));
+}
+
 TEST_F(BadUserFile, OnAFullDiskUploadsWithTheNewLoginAllTheSame)
 {
     const std::string file = writeDescription(minimal());

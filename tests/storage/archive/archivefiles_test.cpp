@@ -146,6 +146,27 @@ TEST_F(ArchiveFiles, ADamagedFileCountsAsAbsentWhole)
     EXPECT_EQ(tree.total(), 2);
 }
 
+TEST_F(ArchiveFiles, OneThatTheSystemRefusesIsToldFromAMissingAndADamagedOne)
+{
+    const auto isUnreadable = []
+    {
+        FAttributes tree;
+        bool result = true;
+        EXPECT_FALSE(FXmlArchive::loadAttributes(u"name", "root", tree, &result));
+        return result;
+    };
+    EXPECT_FALSE(isUnreadable()) << "missing";
+    ASSERT_TRUE(save(1));
+    put(kFile, contentOf(kFile).substr(0, 70));
+    EXPECT_FALSE(isUnreadable()) << "damaged";
+    std::filesystem::remove(root + "/" + kFile);
+    std::filesystem::create_symlink("/proc/self/mem", root + "/" + kFile);
+    EXPECT_TRUE(isUnreadable()) << "opens, and can't be read";
+    std::filesystem::remove(root + "/" + kFile);
+    std::filesystem::create_directory(root + "/" + kFile);
+    EXPECT_TRUE(isUnreadable()) << "can't be opened";
+}
+
 TEST_F(ArchiveFiles, ReadingPrefersTheUsersCopyToTheShippedOne)
 {
     put("app/name.xml", "<root><int name='n' value='3'/></root>");

@@ -107,6 +107,16 @@ int PlatformFiles::changeFolder(const std::string& path)
     return resultOf(chdir(path.c_str()));
 }
 
+int PlatformFiles::syncFolder(const std::string& path)
+{
+    const int folder = ::open(path.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC);
+    if (folder < 0)
+        return errno;
+    const int error = sync(folder);
+    ::close(folder);
+    return error;
+}
+
 bool PlatformFiles::list(const std::string& path, std::vector<std::string>& names)
 {
     dirent** entries = nullptr;

@@ -42,13 +42,17 @@ bool renameArchiveFile(const char16* oldName, const char16* newName, const FFile
     return isUsable(path) && gFileSystem->renameFile(&path, renamed.getName().text16());
 }
 
-FStream* openArchiveFile(const char16* name, int flags, const FFileType& type)
+FStream* openArchiveFile(const char16* name, int flags, const FFileType& type, bool* isUnreadable)
 {
     for (const int folder : {FNPath::kUserFolder, FNPath::kAppFolder})
     {
         FNPath path = getArchivePath(name, folder, type);
-        if (FStream* stream = isUsable(path) ? gFileSystem->openFile(&path, flags, nullptr) : nullptr)
+        int error = 0;
+        if (FStream* stream = isUsable(path) ? gFileSystem->openFile(&path, flags, &error) : nullptr)
             return stream;
+        if (isUnreadable && folder == FNPath::kUserFolder)
+            *isUnreadable =
+                error != 0 && FNFileSystem::fromPlatformErrorCode(error) != FNFileSystem::kNotFound;
     }
     return nullptr;
 }

@@ -3,6 +3,7 @@
 #include "storage/archive/archivefiles.h"
 #include "storage/archive/fxmlarchive.h"
 #include "storage/filesystem/fnfilesystem.h"
+#include "storage/stream/ffilestream.h"
 #include "storage/stream/ffiletype.h"
 #include "storage/stream/fopenflags.h"
 #include "storage/stream/fstream.h"
@@ -73,6 +74,20 @@ void putBack(FNPath& twin, const FNPath& path)
         gFileSystem->removeFile(&twin);
 }
 
+// A disk that refuses leaves it open when the new version is there after a power loss; that it is whole, or the earlier
+// one, holds all the same.
+void syncFolderOf(const FNPath& path)
+{
+    FNPath folder(path.getPathName().text16(), FPath::kFolder);
+    static_cast<void>(gFileSystem->syncFolder(&folder));
+}
+
+bool hasFailed(FStream* stream)
+{
+    const FFileStream* file = FCast(FFileStream, stream);
+    return file && file->error();
+}
+
 bool closeFile(FStream* stream)
 {
     return gFileSystem->closeFile(stream);
@@ -132,6 +147,8 @@ bool FXmlArchive::finishXmlArchiveWrite(bool success, const char16* name, FNPath
         gFileSystem->removeFile(twin);
     else if (twin)
         putBack(*twin, path);
+    if (isReplaced)
+        syncFolderOf(path);
     return isReplaced;
 }
 
@@ -164,14 +181,20 @@ bool FXmlArchive::storeObject(const char16* name, const char* rootTag, CmObject*
     return finishXmlArchiveWrite(isWhole, name, oldPath);
 }
 
-bool FXmlArchive::loadAttributes(const char16* name, const char* rootTag, FAttributes& attributes)
+bool FXmlArchive::loadAttributes(const char16* name, const char* rootTag, FAttributes& attributes,
+                                 bool* isUnreadable)
 {
-    FStream* file = openUserFile(name);
+    bool isRefused = false;
+    FStream* file = openArchiveFile(name, kReadShared, fileTypeNormal(), &isRefused);
+    if (isUnreadable)
+        *isUnreadable = isRefused;
     if (!file)
         return false;
     // A tree of its own: of a damaged file nothing is used.
     FAttributes tree;
     const bool isRead = FXmlArchive(file, false).loadAttributes(rootTag, tree);
+    if (isUnreadable && hasFailed(file))
+        *isUnreadable = true;
     closeFile(file);
     if (isRead)
         attributes.takeAllFrom(tree);

@@ -91,6 +91,8 @@ class FNFileSystem : public FFileSystem
     /// Makes the folders below `from` again below `to`.
     bool copyFolderStructure(FNPath* from, FNPath* to);
     bool copyFolderAndFileStructure(FNPath* from, FNPath* to, UProgressHook* hook);
+    /// Forces the names in a folder to the disk: until then a power loss may undo what was made, renamed or removed.
+    bool syncFolder(FPath* path);
 
     // Files
     /// Moves a file or folder to the desktop's trash.

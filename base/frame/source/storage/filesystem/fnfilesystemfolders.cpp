@@ -200,6 +200,12 @@ bool FNFileSystem::findFile(const FNPath* folder, const char16* name, bool recur
     return false;
 }
 
+bool FNFileSystem::syncFolder(FPath* path)
+{
+    const IPtr<FNPath> native = getNativePathFromPath(path);
+    return native && PlatformFiles::syncFolder(DiskName::find(*native)) == 0;
+}
+
 bool FNFileSystem::changeDir(FPath* path)
 {
     const IPtr<FNPath> native = getNativePathFromPath(path);

@@ -76,6 +76,8 @@ int makeFolder(const std::string& path, bool ownerOnly);
 int rename(const std::string& from, const std::string& to);
 bool isAcrossDevices(int error);
 int changeFolder(const std::string& path);
+/// Forces to the disk which names the folder holds.
+int syncFolder(const std::string& path);
 /// The names in a folder but "." and "..", in the order of their bytes; false where it can't be read.
 bool list(const std::string& path, std::vector<std::string>& names);
 
