@@ -1,8 +1,7 @@
 #pragma once
 
 #include "foundation/text/string.h"
-
-#include <chrono>
+#include "uploadmanager/silencewatch.h"
 
 class PUploadManagerApplication;
 class UploadRequest;
@@ -18,8 +17,6 @@ struct CallbackData
     String error;
     /// That of the connection, which libcurl owns; -1 where nothing is sent.
     int socket = -1;
-    /// How many bytes had gone out when last some went, when that was, and how often it was looked at since.
-    double sent = -1.0;
-    std::chrono::steady_clock::time_point sentAt;
-    int looks = 0;
+    /// A new one for each transfer.
+    SilenceWatch silence;
 };

@@ -9,6 +9,7 @@
 #include "storage/path/fnpath.h"
 #include "storage/url/furl.h"
 #include "uploadmanager/cleartoken.h"
+#include "uploadmanager/deprecatedcurl.h"
 #include "uploadmanager/productlist.h"
 #include "uploadmanager/puploadmanagerapplication.h"
 #include "uploadmanager/serviceconfiguration.h"
@@ -106,7 +107,11 @@ bool PUploadManagerApplication::isValidAccessToken(FString& token)
     checkCurlError(curl_easy_setopt(curl, CURLOPT_URL, url.text8()), data);
     setReplyCallback(curl, data);
     setVerification(curl, data);
-    checkCurlError(curl_easy_perform(curl), data);
+    noteSocket(curl, data);
+    checkCurlError(curl_easy_setopt(curl, CURLOPT_NOPROGRESS, 0L), data);
+    checkCurlError(setProgressFunction(curl, stopSilentTransfer), data);
+    checkCurlError(curl_easy_setopt(curl, CURLOPT_PROGRESSDATA, &data), data);
+    performTransfer(curl, data);
     curl_easy_cleanup(curl);
     return data.error.isEmpty();
 }

@@ -16,8 +16,6 @@
 namespace
 {
 constexpr int kQuestionPollMs = 5;
-constexpr std::chrono::seconds kQuiet{5};
-constexpr int kLooks = 3;
 
 // Without a known total the quotient is no number; the dialog takes any value.
 int truncateToInt(double value)
@@ -41,23 +39,14 @@ int takeSocket(void* data, curl_socket_t socket, curlsocktype)
     return CURL_SOCKOPT_OK;
 }
 
-// A file that can't be read on, or has become shorter, ends there for libcurl, which then waits for the reply to more
-// than it sends, as the service waits for the rest. A network that stalls is another thing: it takes nothing more.
-bool hasStoppedSending(CallbackData& data, double total, double sent)
+SilenceWatch::Verdict watch(CallbackData& data, double total, double sent, double received)
 {
-    const auto now = std::chrono::steady_clock::now();
-    if (sent != data.sent || sent >= total)
-    {
-        data.sent = sent;
-        data.sentAt = now;
-        data.looks = 0;
-        return false;
-    }
-    // Time alone also passes while the process is stopped or a question is up.
-    return sent > 0 && ++data.looks >= kLooks && now - data.sentAt > kQuiet &&
-           PlatformServices::unsentBytes(data.socket) == 0;
+    const SilenceWatch::Bytes bytes = {total, sent, received, PlatformServices::unsentBytes(data.socket)};
+    return data.silence.look(bytes, std::chrono::steady_clock::now());
 }
 
+// A file that can't be read on, or has become shorter, ends there for libcurl, which then waits for the reply to more
+// than it sends, as the service waits for the rest.
 void failUnreadable(CallbackData& data)
 {
     FString text;
@@ -103,18 +92,33 @@ void noteSocket(CURL* curl, CallbackData& data)
     checkCurlError(curl_easy_setopt(curl, CURLOPT_SOCKOPTDATA, &data), data);
 }
 
-int libcurl_progress_callback(void* data, double, double, double ultotal, double ulnow)
+void performTransfer(CURL* curl, CallbackData& data)
+{
+    data.silence = SilenceWatch();
+    CURLcode code = curl_easy_perform(curl);
+    if (code == CURLE_ABORTED_BY_CALLBACK && data.silence.isNetworkSilent())
+        code = CURLE_OPERATION_TIMEDOUT;
+    checkCurlError(code, data);
+}
+
+int stopSilentTransfer(void* data, double, double dlnow, double ultotal, double ulnow)
+{
+    const auto verdict = watch(*static_cast<CallbackData*>(data), ultotal, ulnow, dlnow);
+    return verdict == SilenceWatch::Verdict::kMoving ? 0 : 1;
+}
+
+int libcurl_progress_callback(void* data, double, double dlnow, double ultotal, double ulnow)
 {
     CallbackData& callbackData = *static_cast<CallbackData*>(data);
     PUploadManagerApplication* app = callbackData.app;
     if (!app || !gMessenger || app->isEnding())
         return 1;
     postProgress(callbackData, ulnow / ultotal * 100.0);
-    if (callbackData.request && hasStoppedSending(callbackData, ultotal, ulnow))
-    {
+    const SilenceWatch::Verdict verdict = watch(callbackData, ultotal, ulnow, dlnow);
+    if (verdict == SilenceWatch::Verdict::kFileEnded && callbackData.request)
         failUnreadable(callbackData);
+    if (verdict != SilenceWatch::Verdict::kMoving)
         return 1;
-    }
     if (!app->isCancelRequested())
         return 0;
 

@@ -87,7 +87,7 @@ void UploadThread::upload(CURL* curl, CallbackData& data)
     message->addInt("progress", 0);
     gMessenger->postMessage(manager, message, false, 0);
 
-    checkCurlError(curl_easy_perform(curl), data);
+    performTransfer(curl, data);
     if (!data.error.isEmpty())
         manager->requestFailed(data.request);
 }

@@ -285,9 +285,9 @@ void FaultProxy::release()
     state->isReleased = true;
 }
 
-bool FaultProxy::waitForStalled() const
+bool FaultProxy::waitForStalled(int count) const
 {
-    return waitUntil([&] { return state->stalled > 0; });
+    return waitUntil([&] { return state->stalled >= count; });
 }
 
 std::vector<FaultProxy::Passed> FaultProxy::passed() const

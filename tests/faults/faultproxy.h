@@ -55,8 +55,8 @@ public:
     void plan(std::vector<NetworkFault> faults);
     /// Lets go on what stalls.
     void release();
-    /// Waits until a connection stalls; false if that lasts as long as a hang.
-    bool waitForStalled() const;
+    /// Waits until so many directions stall; false if that lasts as long as a hang.
+    bool waitForStalled(int count = 1) const;
 
     /// The bytes that passed, by connection since the last plan.
     struct Passed

@@ -2,6 +2,8 @@
 #include "tests/faults/faultrunner.h"
 #include "tests/job/job.h"
 
+#include <cstdlib>
+
 namespace
 {
 using Kind = NetworkFault::Kind;
@@ -12,6 +14,9 @@ enum Connection
     kTokenCheck,
     kUpload
 };
+
+/// How long a program may take that ends a silent transfer by itself.
+constexpr std::chrono::minutes kEndsByItself{20};
 
 /// The finished program, the service, and between them a proxy that spoils one connection of each run.
 class Network : public Job
@@ -142,4 +147,37 @@ TEST_F(Network, ThatStallsForEverEndsWithTheSession)
     run.process->terminate();
     run.finish();
     EXPECT_TRUE(exists(file)) << "it was not uploaded";
+}
+
+// The limits are minutes: three programs wait at once, each with a process of its own, since there is no session bus.
+TEST_F(Network, ThatStallsForGoodEndsEveryTransfer)
+{
+    if (!std::getenv("FAULTS_FULL"))
+        GTEST_SKIP() << "takes minutes: part of scripts/faults";
+    const FaultProxy::Passed upload = measure().at(kUpload);
+    setVariable("DBUS_SESSION_BUS_ADDRESS", "");
+    setVariable("XDG_RUNTIME_DIR", root / "none");
+    // The connections in their order: of the first two programs one each for the check of the token.
+    const NetworkFault none, sending = {Kind::stall, false, 1 << 20},
+                             reply = {Kind::stall, true, upload.replied - 40}, check = {Kind::stall, true, 0};
+    proxy.plan({none, sending, none, reply, check});
+    SampleDescription large;
+    large.track({{"Path", writeFile("large.wav", std::string(64 << 20, 'a'))}});
+
+    Tally tally("network, stall for good");
+    std::vector<Run> runs;
+    runs.push_back(start({writeDescription(large, "large.xml")}));
+    ASSERT_TRUE(proxy.waitForStalled(1));
+    for (const int stalled : {2, 3})
+    {
+        runs.push_back(start({writeDescription(description, std::to_string(stalled) + ".xml")}));
+        ASSERT_TRUE(proxy.waitForStalled(stalled));
+    }
+    for (Run& run : runs)
+    {
+        EXPECT_EQ(run.process->wait(kEndsByItself), 0);
+        EXPECT_HOLDS(run.process->output(), "Internal program error.\nError Code: 1028");
+        tally.note("told");
+    }
+    tally.add(static_cast<long>(runs.size()), static_cast<long>(runs.size()));
 }

@@ -295,15 +295,14 @@ std::vector<std::string> Job::environment() const
         if (const char* value = std::getenv(name))
             result.push_back(std::string(name) + "=" + value);
     }
-    std::string language = "LANG=en_US.UTF-8";
+    result.push_back("LANG=en_US.UTF-8");
+    // What is set later counts: of two values of a variable a program takes the first.
     for (const auto& [name, value] : variables)
     {
-        if (name == "LANG")
-            language = name + "=" + value;
-        else
-            result.push_back(name + "=" + value);
+        const std::string beginning = name + "=";
+        std::erase_if(result, [&](const std::string& entry) { return entry.starts_with(beginning); });
+        result.push_back(beginning + value);
     }
-    result.push_back(language);
     return result;
 }
 

@@ -68,7 +68,7 @@ protected:
     std::string runWithoutDisk(const Arguments& arguments);
     /// A start to its end that nobody listens to.
     void runUnheard(const Arguments& arguments);
-    /// Sets a variable of the environment of all further starts.
+    /// Sets a variable of the environment of all further starts; replaces its former value.
     void setVariable(const std::string& name, const std::string& value)
     {
         variables.emplace_back(name, value);
