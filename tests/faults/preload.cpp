@@ -5,12 +5,13 @@
 #include <cstdio>
 #include <cstdlib>
 
+#include <dlfcn.h>
 #include <fcntl.h>
 #include <malloc.h>
 #include <unistd.h>
 
-// Preloaded into a program: one of its allocations finds no memory. It also marks the moment from which calls count,
-// when all libraries are loaded and main is next.
+// Preloaded into a program: one of its allocations finds no memory. It also marks when calls begin to count, as all
+// libraries are loaded and main is next, and when they end, behind main.
 
 extern "C"
 {
@@ -43,6 +44,21 @@ long mark(int number)
     isCounting = number == kBeginCounting;
     return syscall(SYS_getpgid, number);
 }
+
+using Main = int (*)(int, char**, char**);
+Main programMain = nullptr;
+
+// What runs behind this at the end was set up before main: a checker of leaks, whose calls are none of the program's.
+void endCounting()
+{
+    mark(kEndCounting);
+}
+
+int runMain(int count, char** arguments, char** environment)
+{
+    std::atexit(endCounting);
+    return programMain(count, arguments, environment);
+}
 } // namespace
 
 [[gnu::constructor]] static void beginFaults()
@@ -71,6 +87,15 @@ long mark(int number)
 
 extern "C"
 {
+    int __libc_start_main(Main main, int count, char** arguments, void (*init)(), void (*fini)(),
+                          void (*loaderFini)(), void* stackEnd)
+    {
+        programMain = main;
+        const auto next =
+            reinterpret_cast<decltype(&__libc_start_main)>(dlsym(RTLD_NEXT, "__libc_start_main"));
+        return next(runMain, count, arguments, init, fini, loaderFini, stackEnd);
+    }
+
     pid_t getpgid(pid_t process) noexcept
     {
         const bool isMark = process == kBeginCounting || process == kEndCounting;
