@@ -64,6 +64,7 @@ protected:
     Outcome runWith(const Fault& fault)
     {
         fs::remove_all(userFolder);
+        writeUserFile("Defaults", settings());
         const Arguments arguments = prepare();
         const std::size_t before = received("/tracks").size();
         launcher = launcherFor(fault, root / "report");
@@ -85,8 +86,7 @@ protected:
     {
         EXPECT_EQ(tokenFiles().count(contentsOf(userFile("scat"))), 1u)
             << where << ": " << contentsOf(userFile("scat"));
-        if (!exists(userFolder))
-            return;
+        EXPECT_EQ(contentsOf(userFile("Defaults")), settings()) << where;
         for (const fs::directory_entry& file : fs::directory_iterator(userFolder))
         {
             // A version that never was completed has a name that nothing reads.
@@ -206,6 +206,19 @@ protected:
         const std::string printed = run({freshDescription()});
         EXPECT_LACKS(printed, "Error Code:") << where;
         EXPECT_EQ(received("/tracks").size() - before, hasToken ? 1u : 0u) << where << ":\n" << printed;
+    }
+
+    /// As the program writes them; it changes none by itself.
+    static std::string settings()
+    {
+        return "<?xml version=\"1.0\" encoding=\"utf-8\"?>\r<Defaults>\r   <rootObjects>\r"
+               "      <root name=\"Defaults\">\r         <list name=\"Entries\" type=\"list\">\r            "
+               "<item>\r"
+               "               <string name=\"Group\" value=\"g\"/>\r               <member "
+               "name=\"Values\">\r"
+               "                  <int name=\"k\" value=\"7\"/>\r               </member>\r"
+               "               <int name=\"Version\" value=\"0\"/>\r            </item>\r"
+               "         </list>\r      </root>\r   </rootObjects>\r</Defaults>\r";
     }
 
     std::string knownTokens() const { return attributeFile("scat", {{"Loomrit", base64(token())}}); }

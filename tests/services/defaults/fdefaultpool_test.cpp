@@ -145,6 +145,18 @@ TEST_F(Defaults, ADamagedFileLeavesThePoolEmpty)
     }
 }
 
+TEST_F(Defaults, AFileThatCannotBeReadIsLeftAlone)
+{
+    std::filesystem::create_directories(std::filesystem::path(root + "/" + kFile).parent_path());
+    // Opens as a file, and gives an error instead of its first byte.
+    std::filesystem::create_symlink("/proc/self/mem", root + "/" + kFile);
+    const IPtr<FDefaultPool> next = reload();
+    next->postInit();
+    next->setLong("g", "k", 1);
+    EXPECT_TRUE(next->save(false));
+    EXPECT_TRUE(std::filesystem::is_symlink(root + "/" + kFile));
+}
+
 TEST_F(Defaults, AutoSaversAreServedWhenAllHaveRegistered)
 {
     auto saver = adopt(new StoredNode(9));

@@ -115,7 +115,7 @@ void FDefaultPool::terminate()
 void FDefaultPool::load()
 {
     if (!FDefaultsBypass::instance().isSet())
-        FXmlArchive::restoreObject(kFileName, kRootTag, this);
+        FXmlArchive::restoreObject(kFileName, kRootTag, this, &isFileUnreadable);
 }
 
 bool FDefaultPool::save(bool callPreSavers)
@@ -124,7 +124,8 @@ bool FDefaultPool::save(bool callPreSavers)
         return false;
     if (callPreSavers)
         callAll(preSavers());
-    if (!FDefaultsBypass::instance().isSet())
+    // A file that could not be read holds settings that this pool doesn't have: they wait there for a better day.
+    if (!FDefaultsBypass::instance().isSet() && !isFileUnreadable)
         FXmlArchive::storeObject(kFileName, kRootTag, this, false);
     return true;
 }

@@ -70,6 +70,7 @@ private:
     IPtr<FAttributes> pendingAutoSavers;
     bool saveEnabled = false;
     bool terminated = false;
+    bool isFileUnreadable = false;
 };
 
 /// The one pool; null before the program's start made it and after its end.

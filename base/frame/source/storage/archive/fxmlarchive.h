@@ -29,13 +29,14 @@ public:
     // In the user folder, by name without folder and extension. Reading falls back on the application folder.
     /// The earlier file stays whole until the new one is complete.
     static bool saveAttributes(const char16* name, const char* rootTag, const FAttributes& attributes);
-    /// `isUnreadable` may be null; it takes whether there is a file in the user folder of which the system refuses to
-    /// give the content. What it holds is unknown then, and it must not be replaced; a damaged one may.
+    /// Reading takes in `isUnreadable`, which may be null, whether there is a file in the user folder of which the system
+    /// refuses to give the content. What it holds is unknown then, and it must not be replaced; a damaged one may.
     static bool loadAttributes(const char16* name, const char* rootTag, FAttributes& attributes,
                                bool* isUnreadable = nullptr);
     /// With `askUser` asks before an existing file is replaced; false where the answer isn't to replace it.
     static bool storeObject(const char16* name, const char* rootTag, CmObject* object, bool askUser);
-    static bool restoreObject(const char16* name, const char* rootTag, CmObject* object);
+    static bool restoreObject(const char16* name, const char* rootTag, CmObject* object,
+                              bool* isUnreadable = nullptr);
     static bool restoreObject(FStream* stream, const char* rootTag, CmObject* object);
     static bool objectArchiveExists(const char16* name);
     static bool removeObjectArchive(const char16* name);

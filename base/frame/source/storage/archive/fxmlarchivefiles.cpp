@@ -82,15 +82,24 @@ void syncFolderOf(const FNPath& path)
     static_cast<void>(gFileSystem->syncFolder(&folder));
 }
 
-bool hasFailed(FStream* stream)
-{
-    const FFileStream* file = FCast(FFileStream, stream);
-    return file && file->error();
-}
-
 bool closeFile(FStream* stream)
 {
     return gFileSystem->closeFile(stream);
+}
+
+/// What `read` says of the file; false without one.
+template <class Read>
+bool readUserFile(const char16* name, bool* isUnreadable, Read read)
+{
+    bool isRefused = false;
+    FStream* stream = openArchiveFile(name, kReadShared, FXmlArchive::fileTypeNormal(), &isRefused);
+    const bool isRead = stream && read(stream);
+    const FFileStream* file = FCast(FFileStream, stream);
+    if (isUnreadable)
+        *isUnreadable = isRefused || (file && file->error());
+    if (stream)
+        closeFile(stream);
+    return isRead;
 }
 } // namespace
 
@@ -184,31 +193,19 @@ bool FXmlArchive::storeObject(const char16* name, const char* rootTag, CmObject*
 bool FXmlArchive::loadAttributes(const char16* name, const char* rootTag, FAttributes& attributes,
                                  bool* isUnreadable)
 {
-    bool isRefused = false;
-    FStream* file = openArchiveFile(name, kReadShared, fileTypeNormal(), &isRefused);
-    if (isUnreadable)
-        *isUnreadable = isRefused;
-    if (!file)
-        return false;
     // A tree of its own: of a damaged file nothing is used.
     FAttributes tree;
-    const bool isRead = FXmlArchive(file, false).loadAttributes(rootTag, tree);
-    if (isUnreadable && hasFailed(file))
-        *isUnreadable = true;
-    closeFile(file);
+    const auto read = [&](FStream* file) { return FXmlArchive(file, false).loadAttributes(rootTag, tree); };
+    const bool isRead = readUserFile(name, isUnreadable, read);
     if (isRead)
         attributes.takeAllFrom(tree);
     return isRead;
 }
 
-bool FXmlArchive::restoreObject(const char16* name, const char* rootTag, CmObject* object)
+bool FXmlArchive::restoreObject(const char16* name, const char* rootTag, CmObject* object, bool* isUnreadable)
 {
-    FStream* file = openUserFile(name);
-    if (!file)
-        return false;
-    const bool isRestored = restoreObject(file, rootTag, object);
-    closeFile(file);
-    return isRestored;
+    return readUserFile(name, isUnreadable,
+                        [&](FStream* file) { return restoreObject(file, rootTag, object); });
 }
 
 // Files
