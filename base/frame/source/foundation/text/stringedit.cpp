@@ -290,13 +290,13 @@ String& String::assign(char16 character, int count)
 
 String& String::refill(const char* text, unsigned count)
 {
-    const bool fits = count > 0 && count < blockSizeOf(buffer);
+    const bool fits = count > 0 && ((count == len && !isWide) || count < blockSizeOf(buffer));
     if (!fits && (!resize(count, false) || count == 0))
         return *this;
     std::memcpy(buffer, text, count);
     isWide = 0;
     len = count & kMaxTextLength;
-    terminate(count);
+    chars8()[count] = 0;
     return *this;
 }
 

@@ -2,14 +2,12 @@
 
 #include "foundation/text/cmstring.h"
 #include "storage/stream/fstream.h"
-#include "storage/xml/fxmlattribute.h"
+#include "storage/xml/fxmlattributelist.h"
 #include "storage/xml/fxmltokentext.h"
 #include "storage/xml/xmlentities.h"
 #include "storage/xml/xmltext.h"
 
-#include <algorithm>
-#include <array>
-#include <string_view>
+#include <utility>
 
 namespace
 {
@@ -21,27 +19,6 @@ constexpr const char* kErrorMessages[] = {"",
                                           "Unexpected end of file!",
                                           "Not enough actual attributes in tag!",
                                           "Unexpected Tag!"};
-
-using ByteSet = std::array<bool, 256>;
-
-constexpr ByteSet makeSet(std::string_view bytes)
-{
-    ByteSet set{};
-    for (const char c : bytes)
-        set[static_cast<uint8>(c)] = true;
-    return set;
-}
-
-/// The bytes that end a name, or may mean something else than themselves in a value.
-constexpr ByteSet kNameEnds = makeSet({"\0\t\n\r \"&'/<=>?\\", 14});
-constexpr ByteSet kValueEnds = makeSet({"\0\n\r\"&'\\", 7});
-
-const char* findByte(const char* begin, const char* limit, const ByteSet& set)
-{
-    while (begin < limit && !set[static_cast<uint8>(*begin)])
-        begin++;
-    return begin;
-}
 
 bool isTextEqual(const FString& text, const char* other)
 {
@@ -141,8 +118,13 @@ bool FXmlParser::skip()
 bool FXmlParser::processToken(int startDepth, void* data)
 {
     long long size = 0;
-    skipLayout();
-    switch (getNextToken(tokenBuffer.ptr(), &size, false))
+    skipLayout((flags & kKeepSpaces) != 0);
+    if (takePlainEndTag())
+    {
+        endElement(data);
+        return !isElementDone(startDepth);
+    }
+    switch (nextToken(size))
     {
     case kEndOfData:
         if (!tagStack.isEmpty())
@@ -181,6 +163,18 @@ bool FXmlParser::processToken(int startDepth, void* data)
     return true;
 }
 
+/// As `getNextToken`. Leaves the name of a start tag in `tagName`, since the attributes are read into the same buffer
+/// as a token is.
+FXmlParser::Token FXmlParser::nextToken(long long& size)
+{
+    if (takePlainTagName())
+        return kStartTag;
+    const Token kind = getNextToken(tokenBuffer.ptr(), &size, false);
+    if (kind == kStartTag)
+        strcpy(tagName.ptr(), tokenBuffer.ptr() + 1);
+    return kind;
+}
+
 // So a nested call reads exactly the element whose start has been told.
 bool FXmlParser::isElementDone(int startDepth) const
 {
@@ -188,157 +182,19 @@ bool FXmlParser::isElementDone(int startDepth) const
     return depth == startDepth - 1 || ((flags & kStopAfterMainTag) && depth == 0);
 }
 
-void FXmlParser::handleStartTag(void* data)
-{
-    // The attributes are read into the same buffer as the name was.
-    strcpy(tagName.ptr(), tokenBuffer.ptr() + 1);
-    CmArray attributes(0, 10);
-    Token ending = kMalformed;
-    if (readAttributes(attributes, ending) && (ending == kEmptyTagEnd || ending == kTagEnd))
-        tellStartTag(attributes, ending == kEmptyTagEnd, data);
-    else
-        fail(kErrorMalformed);
-    recycle(attributes);
-}
-
-// Reads to the first token that is no attribute. False where an attribute is refused.
-bool FXmlParser::readAttributes(CmArray& attributes, Token& ending)
-{
-    while (true)
-    {
-        long long size = 0;
-        skipBlanks();
-        if (FXmlAttribute* plain = takePlainAttribute())
-        {
-            attributes.add(plain);
-            continue;
-        }
-        ending = getNextToken(tokenBuffer.ptr(), &size, true);
-        if (ending == kLineEnd || ending == kSpace)
-            continue;
-        if (ending != kAttribute)
-            return true;
-        FXmlAttribute* attribute = tokenToAttribute(tokenBuffer.ptr(), size);
-        if (!attribute)
-            return false;
-        attributes.add(attribute);
-    }
-}
-
-void FXmlParser::tellStartTag(CmArray& attributes, bool isEmpty, void* data)
-{
-    IPtr<CmString> name;
-    const char* text = tagName.ptr();
-    if (!isEmpty)
-    {
-        if (tagStack.total() >= kMaxDepth)
-            return fail(kErrorMalformed);
-        name = adopt(new CmString(text));
-        text = name->text8();
-        name->addRef();
-        tagStack.push(name);
-    }
-    if (!skipping && !startTag(text, attributes, isEmpty, data))
-        fail(kErrorUnexpectedTag);
-}
-
-void FXmlParser::handleEndTag(void* data)
-{
-    const auto name = adopt(static_cast<CmString*>(tagStack.pop()));
-    // The text behind the stored name, if it goes on, isn't looked at.
-    if (!name || strncmp(tokenBuffer.ptr() + 2, name->text8(), name->length()) != 0)
-        return fail(kErrorMalformed);
-    if (!skipping && !endTag(name->text8(), data))
-        fail(kErrorUnexpectedTag);
-}
-
 void FXmlParser::handlePI()
 {
-    CmArray attributes(0, 10);
+    FXmlAttributeList attributes;
     Token ending = kMalformed;
     if (!readAttributes(attributes, ending) || ending != kInstructionEnd)
         fail(kErrorMalformed);
     for (int i = 0; i < attributes.total(); i++)
     {
-        const auto* attribute = static_cast<FXmlAttribute*>(attributes.at(i));
+        const FXmlAttribute* attribute = attributes.attributeAt(i);
         if (isTextEqual(attribute->name, "encoding") && isTextEqual(attribute->value, "utf-8"))
             codePage = kEncodingUtf8;
     }
     recycle(attributes);
-}
-
-/// Most attributes lie whole in the buffer and hold nothing that means something else: name="value". They are taken
-/// from where they lie. Null, with nothing read, for any other, which then goes the way of all tokens.
-FXmlAttribute* FXmlParser::takePlainAttribute()
-{
-    const char* const name = buffer + bufferPos;
-    const char* const limit = buffer + buffer.getFillSize();
-    const char* const equals = findByte(name, limit, kNameEnds);
-    if (equals == name || limit - equals < 2 || *equals != '=' || (equals[1] != '"' && equals[1] != '\''))
-        return nullptr;
-    const char* const value = equals + 2;
-    const char* const end = findByte(value, limit, kValueEnds);
-    if (end == limit || *end != equals[1] || equals - name > kMaxAttributeName ||
-        end - value > kMaxAttributeValue)
-        return nullptr;
-    bufferPos += static_cast<uint32>(end + 1 - name);
-    lastLineEnd = 0;
-    return makeAttribute(name, static_cast<int>(equals - name), value, static_cast<int>(end - value));
-}
-
-FXmlAttribute* FXmlParser::makeAttribute(const char* name, int nameLength, const char* value, int valueLength)
-{
-    FXmlAttribute* attribute = takeAttribute();
-    attribute->name.assign(name, nameLength, false);
-    attribute->value.assign(value, valueLength, false);
-    return attribute;
-}
-
-// Gives null where the token is none. The attribute's reference is the caller's until `recycle`.
-FXmlAttribute* FXmlParser::tokenToAttribute(char* token, int64 size)
-{
-    char* const end = token + size;
-    char* nameEnd = token;
-    while (nameEnd < end && *nameEnd != 0 && *nameEnd != '=' && !Xml::isXmlSpace(*nameEnd))
-        nameEnd++;
-    char* equals = nameEnd;
-    while (equals < end && Xml::isXmlSpace(*equals))
-        equals++;
-    char* value = equals + 2;
-    auto length = static_cast<int>(end - 1 - value);
-    if (nameEnd - token > kMaxAttributeName || value >= end || *equals != '=' || length > kMaxAttributeValue)
-        return nullptr;
-    end[-1] = 0;
-
-    bool sawHighBit = false;
-    if (memchr(value, '&', static_cast<size_t>(length)))
-    {
-        removeEntities(value, &sawHighBit, (flags & kWindowsEntities) != 0);
-        length = static_cast<int>(strlen(value));
-    }
-    FXmlAttribute* attribute = makeAttribute(token, static_cast<int>(nameEnd - token), value, length);
-    if (sawHighBit && (flags & kWidenValues))
-        attribute->value.toWideString(codePage);
-    return attribute;
-}
-
-FXmlAttribute* FXmlParser::takeAttribute()
-{
-    const int last = attributePool.total() - 1;
-    if (last < 0)
-        return new FXmlAttribute;
-    auto* attribute = static_cast<FXmlAttribute*>(attributePool.at(last));
-    attributePool.removeAt(last);
-    return attribute;
-}
-
-// In such an order that the next tag's first attribute gets the object of this one's: its texts have often the size
-// that is needed again.
-void FXmlParser::recycle(CmArray& attributes)
-{
-    for (int i = attributes.total() - 1; i >= 0; i--)
-        if (!attributePool.add(attributes.at(i)))
-            attributes.at(i)->release();
 }
 
 // Each '&' is looked at once; the next ';' is looked for only when the last one found has been passed.

@@ -1,13 +1,15 @@
 #pragma once
 
-#include "containers/sequence/cmarray.h"
 #include "containers/sequence/cmstack.h"
 #include "containers/value/cmbuffer.h"
 #include "foundation/object/iptr.h"
+#include "storage/xml/fxmlattributelist.h"
 
+#include <string_view>
+
+class CmString;
 class FStream;
 class FString;
-class FXmlAttribute;
 
 /// The older parser: a tokenizer over 8-bit text that calls virtual handlers and checks only that tags nest.
 ///
@@ -144,7 +146,7 @@ protected:
     CmBuffer buffer;
     CmStack tagStack;
     /// Objects for reuse, each with one reference.
-    CmArray attributePool{0, 10};
+    FXmlAttributeList attributePool;
     uint32 flags = 0;
     uint32 codePage = 0;
 
@@ -168,8 +170,8 @@ private:
     void settleLookAhead();
     template <class Predicate>
     Run copyUntil(TokenText& token, Predicate ends);
-    void skipBlanks();
-    void skipLayout();
+    void skipLayout(bool areBlanksData);
+    bool skipLineEnd();
     void skipSpace();
     void countLines(const char* text, size_t length);
 
@@ -188,10 +190,13 @@ private:
     // Tokens to handlers
     bool processToken(int startDepth, void* data);
     bool isElementDone(int startDepth) const;
+    Token nextToken(long long& size);
     void handleStartTag(void* data);
-    bool readAttributes(CmArray& attributes, Token& ending);
-    void tellStartTag(CmArray& attributes, bool isEmpty, void* data);
+    bool readAttributes(FXmlAttributeList& attributes, Token& ending);
+    void tellStartTag(FXmlAttributeList& attributes, bool isEmpty, void* data);
+    CmString* newTagName();
     void handleEndTag(void* data);
+    void endElement(void* data);
     void handleData(int64 size, void* data);
     void handlePI();
     void handleComment(void* data);
@@ -201,16 +206,26 @@ private:
     void skipDocType();
     bool skipPast(const char* end);
     void tellComment(TokenText& text, bool report, void* data, bool endOfComment);
-    FXmlAttribute* takePlainAttribute();
     FXmlAttribute* tokenToAttribute(char* token, int64 size);
-    FXmlAttribute* makeAttribute(const char* name, int nameLength, const char* value, int valueLength);
-    FXmlAttribute* takeAttribute();
-    void recycle(CmArray& attributes);
+    FXmlAttribute* makeAttribute(std::string_view name, std::string_view value);
+    FXmlAttribute* decodeAttribute(std::string_view name, char* value);
+    void recycle(FXmlAttributeList& attributes);
     void fail(Error code);
+
+    // What lies whole in the buffer. False or null, with nothing read, where it doesn't
+    bool takePlainTagName();
+    bool takePlainTagEnd(Token& ending);
+    bool takePlainEndTag();
+    void takePlainAttributes(FXmlAttributeList& attributes);
+    FXmlAttribute* takePlainAttribute(const char*& place, const char* limit);
+    void passPlain(const char* end);
 
     const uint32 blockSize;
     Buffer tokenBuffer;
     Buffer tagName;
+    /// Those of the last tag, for the next one. Null while in use.
+    IPtr<FXmlAttributeList> spareAttributes;
+    IPtr<CmString> spareName;
     /// The line end that was counted last, while the next byte may still belong to it.
     char lastLineEnd = 0;
 };

@@ -136,28 +136,34 @@ FXmlParser::Run FXmlParser::copyUntil(TokenText& token, Predicate ends)
     return Run::kEnded;
 }
 
-void FXmlParser::skipBlanks()
-{
-    settleLookAhead();
-    while (hasByte() && isBlank(frontByte()))
-        bufferPos++;
-}
-
 // What getNextToken would give as tokens that nobody looks at.
-void FXmlParser::skipLayout()
+void FXmlParser::skipLayout(bool areBlanksData)
 {
     settleLookAhead();
-    TokenText unused(tokenBuffer.ptr());
     while (hasByte())
     {
-        const char c = frontByte();
-        if (c == '\r' || c == '\n')
-            readLineEnd(unused);
-        else if (isBlank(c) && !(flags & kKeepSpaces))
-            bufferPos++;
-        else
+        const char* place = buffer + bufferPos;
+        const char* const limit = buffer + buffer.getFillSize();
+        while (!areBlanksData && place < limit && isBlank(*place))
+            place++;
+        bufferPos = static_cast<uint32>(place - buffer.ptr());
+        if (place == limit)
+            continue;
+        if (*place != '\r' && *place != '\n')
             return;
+        skipLineEnd();
     }
+}
+
+/// Whether it has two characters.
+bool FXmlParser::skipLineEnd()
+{
+    const char partner = frontByte() == '\r' ? '\n' : '\r';
+    bufferPos++;
+    line++;
+    const bool isPair = hasByte() && frontByte() == partner;
+    bufferPos += isPair ? 1 : 0;
+    return isPair;
 }
 
 void FXmlParser::skipSpace()
@@ -223,14 +229,8 @@ FXmlParser::Token FXmlParser::readLineEnd(TokenText& token)
 {
     const char c = frontByte();
     token.add(c);
-    bufferPos++;
-    line++;
-    const char partner = c == '\r' ? '\n' : '\r';
-    if (hasByte() && frontByte() == partner)
-    {
-        token.add(partner);
-        bufferPos++;
-    }
+    if (skipLineEnd())
+        token.add(c == '\r' ? '\n' : '\r');
     return kLineEnd;
 }
 

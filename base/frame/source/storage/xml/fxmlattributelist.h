@@ -1,0 +1,26 @@
+#pragma once
+
+#include "containers/sequence/cmarray.h"
+#include "storage/xml/fxmlattribute.h"
+
+/// The attributes of one tag, or those that wait to be used again. It holds no references, as any array at first. One
+/// thread at a time.
+class FXmlAttributeList : public CmArray
+{
+    DECLARE_TYPE(FXmlAttributeList, CmArray)
+
+    FXmlAttributeList() : CmArray(0, 10) {}
+
+    /// As `add`.
+    bool put(FXmlAttribute* attribute)
+    {
+        if (!makeRoom())
+            return false;
+        append(attribute);
+        return true;
+    }
+    /// Null where there is none.
+    FXmlAttribute* takeLast() { return _total > 0 ? attributeAt(--_total) : nullptr; }
+    /// `index` must be that of an attribute.
+    FXmlAttribute* attributeAt(int index) const { return static_cast<FXmlAttribute*>(_objects[index]); }
+};
