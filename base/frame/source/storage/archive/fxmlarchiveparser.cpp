@@ -8,6 +8,7 @@
 #include "storage/attribute/fsublist.h"
 #include "storage/stream/fmemorystream.h"
 #include "storage/xml/fxmlattribute.h"
+#include "storage/xml/xmltext.h"
 
 #include <cstring>
 #include <string_view>
@@ -106,7 +107,7 @@ const FXmlArchiveParser::Handler* FXmlArchiveParser::findHandler(const char* nam
         {"rootObjects", Place::kRootTag, &FXmlArchiveParser::startRootObjects},
     };
     for (const Handler& handler : handlers)
-        if (strcmp(handler.tag, name) == 0)
+        if (*handler.tag == *name && strcmp(handler.tag, name) == 0)
             return &handler;
     return nullptr;
 }
@@ -233,10 +234,14 @@ bool FXmlArchiveParser::startString(CmContainer& attributes)
     FString* value = findValue(attributes, "value");
     if (!tree || !name || !value)
         return false;
+    // Copied, not taken: the parser fills the same text again for the next tag.
     const char* wide = findText(attributes, "wide");
+    String text;
     if (wide && strcmp(wide, "true") == 0)
-        value->toWideString(kEncodingUtf8);
-    tree->entry(name).takeString(*value);
+        Xml::assignUtf8(text, value->text8(), value->length());
+    else
+        text = *value;
+    tree->entry(name).takeString(text);
     return true;
 }
 

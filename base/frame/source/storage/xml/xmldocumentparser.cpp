@@ -40,7 +40,7 @@ void DocumentParser::startTag(INewXmlParser* from, const char* tag, const char**
     const size_t length = strlen(tag);
     charge(from, sizeof(Element) + kBlockCost + wideCost(length));
     auto* element = new Element;
-    assignUtf8(element->name, tag, length);
+    element->setSource({tag, length});
     addAttributes(from, *element, attributes);
     if (current)
         current->linkBefore(element, nullptr);
@@ -65,8 +65,7 @@ void DocumentParser::addAttributes(INewXmlParser* from, Element& element, const 
             return;
         auto* attribute = new Attribute;
         element.attributes[i / 2] = adopt(attribute);
-        assignUtf8(attribute->name, attributes[i], nameLength);
-        assignUtf8(attribute->value, attributes[i + 1], valueLength);
+        attribute->setSource({attributes[i], nameLength}, {attributes[i + 1], valueLength});
     }
 }
 
@@ -85,7 +84,9 @@ void DocumentParser::charData(INewXmlParser* from, const char* data, int length)
     if (finished || !current)
         return;
     charge(from, sizeof(ElementData) + 2 * kBlockCost + static_cast<size_t>(length));
-    current->linkBefore(new ElementData(data, length), nullptr);
+    auto* node = new ElementData;
+    node->setSource({data, static_cast<size_t>(length)});
+    current->linkBefore(node, nullptr);
 }
 
 void DocumentParser::comment(INewXmlParser* from, const char* text)
@@ -94,7 +95,7 @@ void DocumentParser::comment(INewXmlParser* from, const char* text)
         return;
     charge(from, sizeof(Comment) + kBlockCost + wideCost(strlen(text)));
     auto* node = new Comment(ConstString());
-    assignUtf8(node->name, text);
+    assignUtf8(node->name, std::string_view(text));
     current->linkBefore(node, nullptr);
 }
 

@@ -26,6 +26,25 @@ Element::~Element()
     dropChildren();
 }
 
+bool Element::isNamed(const char16* text) const
+{
+    return source.isEmpty() ? name == text : isEqualText(source.first(), text);
+}
+
+void Element::setSource(std::string_view sourceName)
+{
+    if (source.set(sourceName) && !source.isAscii())
+        widen();
+}
+
+void Element::widen() const
+{
+    if (source.isEmpty())
+        return;
+    assignUtf8(name, source.first());
+    source.drop();
+}
+
 // The children of those children that go with this element are taken over, so that no destructor calls another one
 // deeper down.
 void Element::dropChildren()
@@ -165,7 +184,7 @@ Attribute* Element::getAttribute(const char16* attributeName) const
     if (!attributeName)
         return nullptr;
     for (const IPtr<Attribute>& attribute : attributes)
-        if (attribute->getName() == attributeName)
+        if (attribute->isNamed(attributeName))
             return attribute;
     return nullptr;
 }
@@ -303,7 +322,7 @@ bool Element::printTree(Buffer& out, IBStream* stream) const
 void Element::printStart(Buffer& out) const
 {
     out.put('<');
-    appendUtf8(out, viewOf(name));
+    printName(out);
     for (const IPtr<Attribute>& attribute : attributes)
     {
         out.put(' ');
@@ -320,7 +339,15 @@ void Element::printEnd(Buffer& out) const
     if (!first)
         return;
     out.put("</", 2);
-    appendUtf8(out, viewOf(name));
+    printName(out);
     out.put('>');
+}
+
+void Element::printName(Buffer& out) const
+{
+    if (source.isEmpty())
+        appendUtf8(out, viewOf(name));
+    else
+        out.put(source.first().data(), static_cast<uint32>(source.first().size()));
 }
 } // namespace Xml

@@ -3,6 +3,7 @@
 #include "containers/typed/tarray.h"
 #include "storage/xml/xmlattribute.h"
 #include "storage/xml/xmlnode.h"
+#include "storage/xml/xmlsourcetext.h"
 
 namespace Xml
 {
@@ -20,6 +21,7 @@ class Element : public Node
     Element(const Element&) = delete;
     ~Element() override;
 
+    bool isNamed(const char16* text) const;
     /// Null at the root.
     Node* getParent() const { return parent; }
 
@@ -62,12 +64,16 @@ class Element : public Node
 
 protected:
     void print(Buffer& out) const override;
+    void widen() const override;
 
 private:
     friend class DocumentParser;
 
     /// Without a name.
     Element() : attributes(0, 4) {}
+    /// Takes the name as the parser gave it.
+    void setSource(std::string_view sourceName);
+    void printName(Buffer& out) const;
     bool canAdopt(Node* child) const;
     void linkBefore(Node* child, Node* place);
     void unlink(Node* child);
@@ -84,5 +90,6 @@ private:
     Node* last = nullptr;
     int childCount = 0;
     TArray<IPtr<Attribute>> attributes;
+    mutable SourceText source;
 };
 } // namespace Xml

@@ -15,6 +15,7 @@ ElementData::ElementData(const void* bytes, int length)
 bool ElementData::setData(const void* bytes, int length)
 {
     data.flush();
+    source.drop();
     if (!bytes || length < 0 || !data.setSize(static_cast<uint32>(length) + 1))
         return false;
     memcpy(data.ptr(), bytes, static_cast<size_t>(length));
@@ -24,21 +25,26 @@ bool ElementData::setData(const void* bytes, int length)
 
 const char* ElementData::getData() const
 {
+    if (!source.isEmpty())
+        return source.first().data();
     return getLength() > 0 ? data.str8() : "";
 }
 
 int ElementData::getLength() const
 {
-    return static_cast<int>(data.getFillSize());
+    return static_cast<int>(source.isEmpty() ? data.getFillSize() : source.first().size());
 }
 
 bool ElementData::isFormatData() const
 {
-    return isXmlSpace(data.str8(), data.getFillSize());
+    return isXmlSpace(getData(), static_cast<size_t>(getLength()));
 }
 
 void ElementData::print(Buffer& out) const
 {
-    FXmlWriter::encodeString(out, getData(), true);
+    if (!source.isEmpty() && source.isPlain())
+        out.put(source.first().data(), static_cast<uint32>(source.first().size()));
+    else
+        FXmlWriter::encodeString(out, getData(), true);
 }
 } // namespace Xml

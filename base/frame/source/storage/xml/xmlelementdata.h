@@ -2,6 +2,7 @@
 
 #include "containers/value/buffer.h"
 #include "storage/xml/xmlnode.h"
+#include "storage/xml/xmlsourcetext.h"
 
 namespace Xml
 {
@@ -32,6 +33,13 @@ protected:
     void print(Buffer& out) const override;
 
 private:
+    friend class DocumentParser;
+
+    /// Takes the text as the parser gave it. False where there is no memory.
+    bool setSource(std::string_view text) { return source.set(text); }
+
+    /// Empty while `source` isn't.
     Buffer data;
+    SourceText source;
 };
 } // namespace Xml

@@ -15,6 +15,7 @@ Node::Node(const Node& other) : FObject(other), name(other.name) {}
 
 void Node::setName(const ConstString& text)
 {
+    widen();
     name = text;
     name.toWideString();
 }
@@ -38,7 +39,7 @@ Element* Node::findElement(Node* from, const char16* elementName)
     for (Node* node = from; node; node = node->next)
     {
         Element* element = node->asElement();
-        if (element && (!elementName || element->name == elementName))
+        if (element && (!elementName || element->isNamed(elementName)))
             return element;
     }
     return nullptr;

@@ -26,7 +26,12 @@ class Node : public FObject
     Node(const Node& other);
     Node& operator=(const Node&) = delete;
 
-    const FString& getName() const { return name; }
+    const FString& getName() const
+    {
+        if (name.isEmpty())
+            widen();
+        return name;
+    }
     void setName(const ConstString& text);
 
     /// Appends the node's text to the stream, in UTF-8. False at the first piece that the stream doesn't take.
@@ -47,6 +52,8 @@ protected:
 
     /// Appends the node's text to `out`.
     virtual void print(Buffer& out) const = 0;
+    /// Gives the members their texts, where these are still as the parser gave them.
+    virtual void widen() const {}
     /// Writes and empties the buffer.
     static bool writeBuffer(Buffer& out, IBStream& stream);
     static Element* findElement(Node* from, const char16* elementName);
@@ -56,7 +63,8 @@ private:
     bool linked = false;
 
 protected:
-    FString name;
+    /// Empty while the node has it as the parser gave it; `getName` sees to that.
+    mutable FString name;
 
 private:
     Node* next = nullptr;

@@ -22,9 +22,12 @@ void assignUtf8(String& target, const char* text, size_t length)
     target.take(wide, true, static_cast<unsigned>(count));
 }
 
-void assignUtf8(String& target, const char* text)
+bool isEqualText(std::string_view ascii, const char16* text)
 {
-    assignUtf8(target, text, strlen(text));
+    for (const char c : ascii)
+        if (*text++ != static_cast<char16>(c))
+            return false;
+    return *text == 0;
 }
 
 bool isXmlSpace(const char* text, size_t length)
@@ -39,6 +42,13 @@ void appendUtf8(Buffer& out, std::u16string_view text)
     const auto length = static_cast<uint32>(text.size());
     if (out.grow(before + length * static_cast<uint32>(kMostBytes)))
         out.setFillSize(before + encodeUtf8(text.data(), length, out + before, '?'));
+}
+
+char* extend(Buffer& out, size_t count)
+{
+    const uint32 before = out.getFillSize();
+    const size_t size = before + count;
+    return size <= UINT32_MAX && out.setFillSize(static_cast<uint32>(size)) ? out + before : nullptr;
 }
 
 void appendText(Buffer& out, const char* text)

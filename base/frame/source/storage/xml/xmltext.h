@@ -10,7 +10,12 @@ namespace Xml
 {
 /// Gives `target` the wide text of `length` bytes in UTF-8, with a blank for each byte that means nothing.
 void assignUtf8(String& target, const char* text, size_t length);
-void assignUtf8(String& target, const char* text);
+inline void assignUtf8(String& target, std::string_view text)
+{
+    assignUtf8(target, text.data(), text.size());
+}
+/// Whether the two have the same characters, given one in ASCII.
+bool isEqualText(std::string_view ascii, const char16* text);
 
 /// The characters of a text, which is made wide where it isn't.
 inline std::u16string_view viewOf(const String& text)
@@ -28,6 +33,13 @@ inline bool isXmlSpace(char c)
 
 /// Appends the text in UTF-8, without a terminator and without entities.
 void appendUtf8(Buffer& out, std::u16string_view text);
+/// The place of as many more bytes, which count as filled; null where there is no memory.
+char* extend(Buffer& out, size_t count);
+/// Gives the place behind the copy.
+inline char* copyText(char* to, std::string_view text)
+{
+    return to + text.copy(to, text.size());
+}
 /// Appends an 8-bit text as it stands, without its terminator.
 void appendText(Buffer& out, const char* text);
 } // namespace Xml
