@@ -5,7 +5,7 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size)
 {
     FuzzText input(data, size);
     const std::u16string delimiters[] = {input.takeText(20), input.takeText(20)};
-    const std::u16string text = input.takeText(4000);
+    const std::u16string text = input.takeText(size);
     CmTokens tokens(text.c_str());
     for (size_t i = 0;; i++)
     {

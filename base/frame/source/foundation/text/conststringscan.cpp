@@ -7,6 +7,9 @@
 
 namespace
 {
+/// A number in any form begins with one of these.
+constexpr const char* kBeginnings = "+-.0123456789abcdefABCDEFinIN";
+
 /// Whether a number stands at `text`. The standard function measures all that follows at each call, so it gets to
 /// see a window only, which keeps a scan of a long text without numbers linear.
 template <class T>
@@ -16,9 +19,11 @@ bool scanAt(const char* text, const char* format, T& value)
     char window[kWindow + 1];
     while (std::isspace(static_cast<unsigned char>(*text)))
         ++text;
-    std::size_t length = 0;
-    for (; length < kWindow && text[length] != 0; ++length)
-        window[length] = text[length];
+    if (!std::strchr(kBeginnings, *text))
+        return false;
+    const void* end = std::memchr(text, 0, kWindow);
+    const auto length = end ? static_cast<std::size_t>(static_cast<const char*>(end) - text) : kWindow;
+    std::memcpy(window, text, length);
     window[length] = 0;
     if (std::sscanf(window, format, &value) != 1)
         return false;
