@@ -223,6 +223,27 @@ TEST(FPreset, KeepsObjectsOfClassesThatItDoesNotKnow)
     EXPECT_EQ(stored->getObjectAttributes("Object")->getInt("Level"), 7) << "written again as it was";
 }
 
+TEST(FPreset, LeavesOutAnUnknownObjectThatLeadsBackToIt)
+{
+    const int before = StoredNode::alive;
+    {
+        FAttributes tree;
+        FPresetList list;
+        ASSERT_TRUE(load(listOf(1, {2, 3}) + object("FPreset", 2, presetOf(4)) +
+                             object("FPresetList", 3, listOf(3, {5, 6})) +
+                             object("FMissing", 4, objects("Objects", {3})) +
+                             object("FPreset", 5, presetOf(4)) + object("FPreset", 6, presetOf(7)) +
+                             object("StoredNode", 7, "<int name=\"Number\" value=\"8\"/>"),
+                         tree));
+        ASSERT_TRUE(list.restoreAttributes(tree));
+        EXPECT_EQ(presetsOf(list), "p=? l3(p=? p=8)");
+        EXPECT_TRUE(archived(*list.getPreset(0))->getObjectAttributes("Object"))
+            << "this one closes no circle";
+        EXPECT_FALSE(archived(*list.getSubList(0)->getPreset(0))->getObjectAttributes("Object"));
+    }
+    EXPECT_EQ(StoredNode::alive, before) << "a circle would never be released";
+}
+
 TEST(FPresetPointer, FollowsItsPreset)
 {
     UpdateHandler::instance();

@@ -2,6 +2,7 @@
 
 #include "foundation/object/classfactory.h"
 #include "storage/attribute/fxmlinstance.h"
+#include "storage/attribute/fxmlreference.h"
 
 namespace
 {
@@ -21,7 +22,11 @@ FXmlInstance* findUnknown(CmObject* stored)
 IPtr<CmObject> keepStoredObject(CmObject* stored)
 {
     if (FXmlInstance* unknown = findUnknown(stored))
-        return unknown;
+    {
+        // Whoever holds the stored form of what leads to the holder is never released.
+        const auto* reference = FCast(FXmlReference, stored);
+        return reference && !reference->countsTarget() ? nullptr : unknown;
+    }
     return resolveObject(stored, nullptr);
 }
 

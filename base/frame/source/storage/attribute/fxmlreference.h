@@ -23,6 +23,8 @@ class FXmlReference : public FXmlObject
     /// Borrowed; null where the number belongs to no object of the file.
     FXmlObject* getTarget() const { return target; }
     void setTarget(FXmlInstance* instance, bool counted);
+    /// False where the reference leads back to the object in whose tree it stands.
+    bool countsTarget() const { return isCounted; }
 
 private:
     friend class FXmlInstance;
