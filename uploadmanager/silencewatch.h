@@ -15,7 +15,7 @@ public:
 
     /// A file that gives nothing more is on a disk: that shows soon.
     static constexpr std::chrono::seconds kFileLimit{5};
-    /// A phone that changes cells is heard again within a minute; the system asks at 100 seconds at the latest.
+    /// A phone that lost its cell is mostly heard again within a minute; by then the system pauses as long between tries.
     static constexpr std::chrono::minutes kSendingLimit{2};
     /// A service may work on what it got before it replies. The library gives a connection as long to come about.
     static constexpr std::chrono::minutes kReplyLimit{5};
