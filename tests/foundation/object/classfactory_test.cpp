@@ -237,25 +237,50 @@ TEST(StringHash, MultipliesBy64WithTheCharactersSign)
     EXPECT_EQ(hashString16(u"", 50), 0u);
 }
 
+/// What has the remainder taken behind every character.
+template <class Character>
+unsigned hashByTheRule(const std::basic_string<Character>& text, unsigned size)
+{
+    unsigned hash = 0;
+    for (const Character c : text)
+        hash = ((hash << 6) + (sizeof(c) == 1 ? static_cast<unsigned>(static_cast<signed char>(c))
+                                              : static_cast<unsigned>(c))) %
+               size;
+    return hash;
+}
+
 TEST(StringHash, TakesTheRemainderBehindEveryCharacter)
 {
-    const auto byTheRule = [](const std::string& text, unsigned size)
+    const std::string narrow[] = {"a longer name of forty characters or so", std::string(40, '\x7F'),
+                                  "Gr\xC3\xB6\xC3\x9F", "mostly plain, one is not \xFF", "\x80"};
+    const std::u16string wide[] = {u"a longer name of forty characters or so", std::u16string(40, u'\xFFFF'),
+                                   u"Gr\u00F6\u00DFe"};
+    for (const unsigned size : {1u, 2u, 50u, 1021u, 10007u, 1u << 25, (1u << 25) + 1, 0xFFFFFFFFu})
     {
-        unsigned hash = 0;
-        for (const char c : text)
-            hash = ((hash << 6) + static_cast<unsigned>(static_cast<signed char>(c))) % size;
-        return hash;
-    };
-    for (const char* text : {"a longer name of forty characters or so", "\x7F\x7F\x7F\x7F\x7F\x7F\x7F\x7F",
-                             "Gr\xC3\xB6\xC3\x9F"
-                             "e \xFF\xFF",
-                             "\x80", "1234567"})
-        for (const unsigned size : {1u, 2u, 50u, 1021u, 1u << 25, (1u << 25) + 1, 0xFFFFFFFFu})
-            EXPECT_EQ(hashString8(text, size), byTheRule(text, size)) << text << " of " << size;
-    unsigned hash = 0;
-    for (int i = 0; i < 9; i++)
-        hash = ((hash << 6) + 0xFFFFu) % (1u << 25);
-    EXPECT_EQ(hashString16(std::u16string(9, u'\xFFFF').c_str(), 1u << 25), hash);
+        for (const std::string& text : narrow)
+            for (size_t start = 0; start < text.size(); start++)
+                EXPECT_EQ(hashString8(text.c_str() + start, size), hashByTheRule(text.substr(start), size))
+                    << text << " from " << start << " of " << size;
+        for (const std::u16string& text : wide)
+            for (size_t start = 0; start < text.size(); start++)
+                EXPECT_EQ(hashString16(text.c_str() + start, size), hashByTheRule(text.substr(start), size))
+                    << "wide text from " << start << " of " << size;
+    }
+}
+
+TEST(StringHash, MarksEqualTextsAlike)
+{
+    const std::string narrow = "a name of both widths";
+    const std::u16string wide(narrow.begin(), narrow.end());
+    int shared = 0;
+    for (size_t length = 1; length <= narrow.size(); length++)
+    {
+        EXPECT_EQ(hashString8(narrow.c_str(), length, 7).mark, hashString16(wide.c_str(), length, 7).mark);
+        if (hashString8(narrow.c_str(), length, 7).mark == hashString8(narrow.c_str(), length - 1, 7).mark)
+            shared++;
+    }
+    EXPECT_EQ(shared, 0) << "what tells nothing apart is no mark";
+    EXPECT_EQ(hashString8("\xC4pfel", 5, 7).mark, 0u) << "of other characters in 16 bits";
 }
 
 TEST(CmDelegatingUnknown, AnswersForItsDelegate)

@@ -1,7 +1,6 @@
 #include "foundation/text/cmstring.h"
 
 #include "foundation/object/fastcast.h"
-#include "foundation/object/stringhash.h"
 
 #include <cstring>
 
@@ -26,5 +25,11 @@ int CmString::compare(const CmObject* other) const
 
 unsigned CmString::hash(unsigned size) const
 {
-    return isWide ? hashString16(ConstString::text16(), size) : hashString8(ConstString::text8(), size);
+    return hashAndMark(size).bucket;
+}
+
+TextHash CmString::hashAndMark(unsigned size) const
+{
+    return isWide ? hashString16(static_cast<const char16*>(buffer), len, size)
+                  : hashString8(static_cast<const char*>(buffer), len, size);
 }
