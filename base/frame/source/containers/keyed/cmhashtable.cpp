@@ -1,5 +1,8 @@
 #include "containers/keyed/cmhashtable.h"
 
+#include "containers/keyed/cmassociation.h"
+#include "foundation/text/cmstring.h"
+
 #include <climits>
 #include <cstdlib>
 #include <utility>
@@ -24,11 +27,32 @@ void append(CmHashBucket& bucket, CmHashNode* node)
     bucket.count++;
 }
 
-CmHashNode* findEqual(CmHashNode* node, const CmObject* object)
+/// What `isA` gives for objects of this very class, and for none derived from it, which might compare in another way.
+template <class Class>
+const char* exactName()
 {
-    while (node && !node->object->isEqual(object))
-        node = node->next;
-    return node;
+    static const char* const name = Class().isA();
+    return name;
+}
+
+/// The text that is to be hashed: the object itself, or the key of an association. Null for what is no plain text.
+const CmString* textOf(const CmObject* object)
+{
+    const char* name = object->isA();
+    if (name == exactName<CmAssociation>())
+    {
+        object = static_cast<const CmAssociation*>(object)->getKey();
+        name = object ? object->isA() : nullptr;
+    }
+    return name == exactName<CmString>() ? static_cast<const CmString*>(object) : nullptr;
+}
+
+/// Most texts that share a bucket are told apart by their marks, without a look at them.
+bool isEqualTo(const CmHashNode* node, const CmObject* object, uint32 mark)
+{
+    if (node->mark != mark && node->mark != 0 && mark != 0)
+        return false;
+    return node->object->isEqual(object);
 }
 } // namespace
 
@@ -65,7 +89,9 @@ bool CmHashTable::resize(int newSize)
         for (CmHashNode* node = _buckets[i].first; node;)
         {
             CmHashNode* moved = std::exchange(node, node->next);
-            append(buckets[bucketNumber(moved->object, newSize)], moved);
+            const TextHash place = placeOf(moved->object, newSize);
+            moved->mark = place.mark;
+            append(buckets[place.bucket], moved);
             _total++;
         }
     free(std::exchange(_buckets, buckets));
@@ -78,19 +104,19 @@ bool CmHashTable::add(CmObject* object)
     if (!object || _size == 0)
         return false;
     growIfCrowded();
-    return addTo(*bucketOf(object), object);
+    return addAt(placeOf(object, _size), object);
 }
 
 bool CmHashTable::addUnique(CmObject* object)
 {
     if (!object || _size == 0)
         return false;
-    CmHashBucket* bucket = bucketOf(object);
-    if (findEqual(bucket->first, object))
+    TextHash place = placeOf(object, _size);
+    if (find(object, place))
         return false;
     if (growIfCrowded())
-        bucket = bucketOf(object);
-    return addTo(*bucket, object);
+        place = placeOf(object, _size);
+    return addAt(place, object);
 }
 
 bool CmHashTable::growIfCrowded()
@@ -99,9 +125,9 @@ bool CmHashTable::growIfCrowded()
            resize(_size * kGrowthFactor);
 }
 
-bool CmHashTable::addTo(CmHashBucket& bucket, CmObject* object)
+bool CmHashTable::addAt(const TextHash& place, CmObject* object)
 {
-    append(bucket, new CmHashNode{nullptr, object});
+    append(_buckets[place.bucket], new CmHashNode{nullptr, object, place.mark});
     _total++;
     testRemember(object);
     return true;
@@ -118,10 +144,11 @@ CmObject* CmHashTable::takeEqual(const CmObject* object)
 {
     if (!object || _size == 0)
         return nullptr;
-    CmHashBucket& bucket = *bucketOf(object);
+    const TextHash place = placeOf(object, _size);
+    CmHashBucket& bucket = _buckets[place.bucket];
     CmHashNode* predecessor = nullptr;
     for (CmHashNode* node = bucket.first; node; predecessor = node, node = node->next)
-        if (node->object->isEqual(object))
+        if (isEqualTo(node, object, place.mark))
             return unlink(bucket, predecessor, node);
     return nullptr;
 }
@@ -167,7 +194,7 @@ bool CmHashTable::containsAbs(const CmObject* object) const
 {
     if (!object || _size == 0)
         return false;
-    const CmHashNode* node = bucketOf(object)->first;
+    const CmHashNode* node = _buckets[placeOf(object, _size).bucket].first;
     while (node && node->object != object)
         node = node->next;
     return node != nullptr;
@@ -191,18 +218,25 @@ CmHashNode* CmHashTable::find(const CmObject* object) const
 {
     if (!object || _size == 0)
         return nullptr;
-    return findEqual(bucketOf(object)->first, object);
+    return find(object, placeOf(object, _size));
 }
 
-CmHashBucket* CmHashTable::bucketOf(const CmObject* object) const
+CmHashNode* CmHashTable::find(const CmObject* object, const TextHash& place) const
 {
-    return &_buckets[bucketNumber(object, _size)];
+    CmHashNode* node = _buckets[place.bucket].first;
+    while (node && !isEqualTo(node, object, place.mark))
+        node = node->next;
+    return node;
 }
 
-unsigned CmHashTable::bucketNumber(const CmObject* object, int size) const
+TextHash CmHashTable::placeOf(const CmObject* object, int size) const
 {
     const unsigned count = static_cast<unsigned>(size);
-    return _hashFunction ? _hashFunction(object, count) : object->hash(count);
+    if (_hashFunction)
+        return {_hashFunction(object, count), 0};
+    if (const CmString* text = textOf(object))
+        return text->hashAndMark(count);
+    return {object->hash(count), 0};
 }
 
 CmObject* CmHashTable::unlink(CmHashBucket& bucket, CmHashNode* predecessor, CmHashNode* node)
