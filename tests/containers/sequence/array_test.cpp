@@ -51,6 +51,27 @@ TEST(CmArray, GrowsByItsDelta)
     EXPECT_EQ(item.getRefCount(), 1u);
 }
 
+TEST(CmArray, KeepsItsElementsThroughManySteps)
+{
+    CmArray array(0, 3);
+    array.takeElements();
+    for (int rank = 0; rank < 1000; rank++)
+    {
+        ASSERT_TRUE(array.add(new Item(rank)));
+        ASSERT_EQ(array.size(), rank / 3 * 3 + 3);
+    }
+    for (const int size : {999, 501, 500, 17, 16, 1})
+    {
+        ASSERT_TRUE(array.resize(size));
+        ASSERT_EQ(rankOf(array.at(size - 1)), size - 1);
+        ASSERT_EQ(array.total(), size);
+    }
+    EXPECT_TRUE(array.resize(40));
+    for (int rank = 1; rank < 41; rank++)
+        ASSERT_TRUE(array.add(new Item(rank)));
+    EXPECT_EQ(rankOf(array.at(40)), 40);
+}
+
 TEST(CmArray, RemovesTheVeryObjectOnly)
 {
     CmArray array;

@@ -3,6 +3,7 @@
 #include "containers/sequence/cmarrayiterator.h"
 
 #include <algorithm>
+#include <bit>
 #include <climits>
 #include <cstdlib>
 #include <cstring>
@@ -12,6 +13,16 @@ namespace
 bool cmpObjs(const CmObject* left, const CmObject* right)
 {
     return left->compare(right) < 0;
+}
+
+/// The places that are asked of the system: up to an eighth more than `places`, so that an array with a small step
+/// isn't moved at each of them.
+int roomFor(int places)
+{
+    const unsigned wanted = static_cast<unsigned>(places);
+    const unsigned step = std::max(std::bit_floor(wanted) / 8, 1u);
+    const unsigned rounded = (wanted + step - 1) / step * step;
+    return static_cast<int>(std::min(rounded, static_cast<unsigned>(INT_MAX)));
 }
 
 void move(CmObject** to, CmObject* const* from, int count)
@@ -128,10 +139,13 @@ bool CmArrayBase::reallocate(int newSize)
         _size = 0;
         return true;
     }
-    void* places = realloc(static_cast<void*>(_objects), static_cast<size_t>(newSize) * sizeof *_objects);
-    if (!places)
-        return false;
-    _objects = static_cast<CmObject**>(places);
+    if (const int room = roomFor(newSize); !_objects || room != roomFor(_size))
+    {
+        void* places = realloc(static_cast<void*>(_objects), static_cast<size_t>(room) * sizeof *_objects);
+        if (!places)
+            return false;
+        _objects = static_cast<CmObject**>(places);
+    }
     for (; _size < newSize; _size++)
         _objects[_size] = nullptr;
     _size = newSize;
