@@ -221,6 +221,25 @@ TEST(String, ConvertsBetweenEncodings)
     EXPECT_FALSE(empty.isWideString());
 }
 
+TEST(String, ConvertsLongTextsToUtf8)
+{
+    // Blocks are converted at once, so a character that isn't plain may stand anywhere in one.
+    for (const unsigned length : {1u, 15u, 16u, 17u, 127u, 128u, 129u, 300u, 400u})
+        for (unsigned place = 0; place < length; place++)
+        {
+            std::u16string wide(length, u'x');
+            wide[place] = u'\u3042';
+            std::string expected(length, 'x');
+            expected.replace(place, 1, "\u3042");
+            String text(wide.c_str());
+            EXPECT_TRUE(text.toMultiByte(kEncodingUtf8));
+            ASSERT_EQ(text.text8(), expected) << length << ", " << place;
+        }
+    String plain(std::u16string(1000, u'x').c_str());
+    EXPECT_TRUE(plain.toMultiByte(kEncodingUtf8));
+    EXPECT_EQ(plain.text8(), std::string(1000, 'x'));
+}
+
 TEST(String, ChangesCaseAndForm)
 {
     String narrow("aB\x8A");

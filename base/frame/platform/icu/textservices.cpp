@@ -56,6 +56,35 @@ unsigned encode(const CodePage& page, const char16* text, unsigned length, char*
     return static_cast<unsigned>(out - result);
 }
 
+/// With room for what `capacity` says; null, and the text is gone, where memory ran out.
+char* enlarge(char* text, std::size_t capacity)
+{
+    auto* larger = static_cast<char*>(std::realloc(text, capacity + 1));
+    if (!larger)
+        std::free(text);
+    return larger;
+}
+
+/// A text that begins with many characters below 128 gets no more room than these need until another one is met.
+char* toUtf8(const char16* text, unsigned length, char loss, unsigned& resultLength)
+{
+    constexpr unsigned kBeginning = 256;
+    const bool seemsAscii = isAsciiText(text, std::min(length, kBeginning));
+    std::size_t capacity = seemsAscii ? length : std::size_t{3} * length;
+    char* result = allocate<char>(capacity);
+    const unsigned start = result && seemsAscii ? encodeAsciiStart(text, length, result) : 0;
+    const unsigned rest = length - start;
+    if (result && seemsAscii && rest > 0)
+    {
+        capacity = start + std::size_t{3} * rest;
+        result = enlarge(result, capacity);
+    }
+    if (!result)
+        return nullptr;
+    resultLength = start + encodeUtf8(text + start, rest, result + start, loss);
+    return fit(result, capacity, resultLength);
+}
+
 /// What `map` makes of one character, if that is one character.
 template <class Map>
 char16 mapCharacter(char16 character, Map map)
@@ -105,14 +134,13 @@ char16* IcuTextServices::toWide(const char* text, unsigned length, unsigned enco
 char* IcuTextServices::toMultiByte(const char16* text, unsigned length, unsigned encoding, char loss,
                                    unsigned& resultLength)
 {
-    const bool isUtf8 = encoding == kEncodingUtf8;
-    const std::size_t most = isAsciiText(text, length) ? 1 : isUtf8 ? 3 : 2;
-    const std::size_t capacity = length * most;
+    if (encoding == kEncodingUtf8)
+        return toUtf8(text, length, loss, resultLength);
+    const std::size_t capacity = isAsciiText(text, length) ? length : std::size_t{2} * length;
     auto* result = allocate<char>(capacity);
     if (!result)
         return nullptr;
-    resultLength = isUtf8 ? encodeUtf8(text, length, result, loss)
-                          : encode(CodePage::get(encoding), text, length, result, loss);
+    resultLength = encode(CodePage::get(encoding), text, length, result, loss);
     return fit(result, capacity, resultLength);
 }
 

@@ -8,6 +8,7 @@
 namespace
 {
 constexpr unsigned kBlock = 16;
+constexpr unsigned kLargeBlock = 128;
 
 using Byte = unsigned char;
 
@@ -120,6 +121,35 @@ void copyAscii(const From*& in, const From* end, To*& out)
         *out++ = static_cast<To>(*in++);
 }
 
+template <unsigned size>
+bool isAsciiBlock(const char16* text)
+{
+    uint64 all = 0;
+    for (unsigned i = 0; i < size; i += sizeof(uint64) / sizeof(char16))
+    {
+        uint64 word = 0;
+        memcpy(&word, text + i, sizeof(word));
+        all |= word;
+    }
+    return (all & kAboveAscii<char16>) == 0;
+}
+
+/// Cuts blocks of `size` characters to bytes, up to the first one that has a character above 127.
+template <unsigned size>
+void narrowAsciiBlocks(const char16*& in, const char16* end, char*& out)
+{
+    for (; end - in >= size && isAsciiBlock<size>(in); in += size)
+        for (unsigned i = 0; i < size; i += kBlock)
+        {
+            // What is written to a place of its own can't be what is read next, and so goes through wide registers.
+            char to[kBlock];
+            for (unsigned k = 0; k < kBlock; ++k)
+                to[k] = static_cast<char>(in[i + k]);
+            memcpy(out, to, sizeof(to));
+            out += kBlock;
+        }
+}
+
 /// Writes the character above 127 at `in` and steps behind it.
 Byte* encodeCharacter(const char16*& in, const char16* end, Byte* out, char loss)
 {
@@ -168,6 +198,17 @@ unsigned decodeUtf8(const char* text, unsigned length, char16* result, char16 lo
             }
     }
     return static_cast<unsigned>(out - result);
+}
+
+unsigned encodeAsciiStart(const char16* text, unsigned length, char* result)
+{
+    const char16* in = text;
+    const char16* end = in + length;
+    narrowAsciiBlocks<kLargeBlock>(in, end, result);
+    narrowAsciiBlocks<kBlock>(in, end, result);
+    while (in < end && *in < 0x80)
+        *result++ = static_cast<char>(*in++);
+    return static_cast<unsigned>(in - text);
 }
 
 unsigned encodeUtf8(const char16* text, unsigned length, char* result, char loss)

@@ -10,3 +10,6 @@ unsigned decodeUtf8(const char* text, unsigned length, char16* result, char16 lo
 
 /// Writes at most `3 * length` bytes. Each half of a surrogate pair that stands alone gives one `loss`.
 unsigned encodeUtf8(const char16* text, unsigned length, char* result, char loss);
+
+/// The characters before the first one above 127 alone: writes as many bytes, at most `length`.
+unsigned encodeAsciiStart(const char16* text, unsigned length, char* result);
