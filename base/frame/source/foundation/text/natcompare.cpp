@@ -42,15 +42,14 @@ int measureDigits(const Char* text)
 template <class Char>
 int compareNumbers(const Char*& a, const Char*& b)
 {
-    const int zerosA = skipZeros(a);
-    const int zerosB = skipZeros(b);
-    const int digits = measureDigits(a);
-    if (const int difference = digits - measureDigits(b))
+    const int zeros = skipZeros(a) - skipZeros(b);
+    int firstDifference = 0;
+    for (; isDigitAt(a) && isDigitAt(b); ++a, ++b)
+        firstDifference = firstDifference ? firstDifference : *a - *b;
+    // At most one of them goes on.
+    if (const int difference = measureDigits(a) - measureDigits(b))
         return difference;
-    for (int i = 0; i < digits; ++i, ++a, ++b)
-        if (*a != *b)
-            return valueOf(*a) - valueOf(*b);
-    return zerosA - zerosB;
+    return firstDifference ? firstDifference : zeros;
 }
 
 template <class Char>
