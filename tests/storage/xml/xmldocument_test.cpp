@@ -116,6 +116,32 @@ TEST(XmlDocument, SavesWhatItLoaded)
     EXPECT_EQ(saved(document, false), text);
 }
 
+// Texts and attributes stay as they were in the file until someone asks for one.
+TEST(XmlDocument, SavesTheSameWhatEverWasLookedAt)
+{
+    const std::string text =
+        "<a x=\"1 &amp; 2\" y=\"\"><bb z=\"\u00E4\">&lt;&gt;</bb><b q=\"&quot;\" r=\"plain\"/></a>";
+    Document document;
+    ASSERT_TRUE(load(document, text));
+    Element* root = document.getRootElement();
+    Element* last = root->firstElement(u"b");
+    ASSERT_TRUE(last && last == root->lastChild());
+    EXPECT_EQ(last->countAttributes(), 2);
+    EXPECT_EQ(saved(document, false), text);
+    EXPECT_EQ(narrow(root->getAttribute(u"x")->getValue()), "1 & 2");
+    EXPECT_TRUE(root->attributeAt(1)->getValue().isWideString());
+    EXPECT_EQ(root->attributeAt(2), nullptr);
+    EXPECT_EQ(narrow(last->getName()), "b");
+    EXPECT_EQ(saved(document, false), text);
+
+    last->setName(u"c");
+    last->removeAttribute(last->getAttribute(u"q"));
+    root->firstElement()->addAttribute(adopt(new Attribute(u"w", u"3")));
+    static_cast<ElementData*>(root->firstElement()->firstChild())->setData("-", 1);
+    EXPECT_EQ(saved(document, false),
+              "<a x=\"1 &amp; 2\" y=\"\"><bb z=\"\u00E4\" w=\"3\">-&gt;</bb><c r=\"plain\"/></a>");
+}
+
 TEST(XmlDocument, LaysOutATree)
 {
     Document document;

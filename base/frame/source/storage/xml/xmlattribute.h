@@ -1,7 +1,6 @@
 #pragma once
 
 #include "storage/xml/xmlnode.h"
-#include "storage/xml/xmlsourcetext.h"
 
 namespace Xml
 {
@@ -13,31 +12,14 @@ class Attribute : public Node
     Attribute() = default;
     Attribute(const ConstString& name, const ConstString& value);
 
-    const FString& getValue() const
-    {
-        if (value.isEmpty())
-            widen();
-        return value;
-    }
+    const FString& getValue() const { return value; }
     void setValue(const ConstString& text);
-    bool isNamed(const char16* text) const;
 
 protected:
-    friend class DocumentParser;
     friend class Element;
 
     void print(Buffer& out) const override;
-    void widen() const override;
 
-    mutable FString value;
-
-private:
-    /// Takes the texts as the parser gave them.
-    void setSource(std::string_view sourceName, std::string_view sourceValue);
-
-    void printPlain(Buffer& out) const;
-    void printText(Buffer& out, std::string_view ascii, const FString& text) const;
-
-    mutable SourceText source;
+    FString value;
 };
 } // namespace Xml

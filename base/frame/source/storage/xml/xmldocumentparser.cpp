@@ -37,36 +37,17 @@ void DocumentParser::startTag(INewXmlParser* from, const char* tag, const char**
 {
     if (finished)
         return;
-    const size_t length = strlen(tag);
-    charge(from, sizeof(Element) + kBlockCost + wideCost(length));
     auto* element = new Element;
-    element->setSource({tag, length});
-    addAttributes(from, *element, attributes);
+    const size_t textSize = element->setSource(tag, attributes);
+    // As much as it takes when someone has asked for its texts.
+    const auto count = static_cast<size_t>(element->countAttributes());
+    charge(from,
+           sizeof(Element) + kBlockCost + wideCost(textSize) + count * (sizeof(Attribute) + 3 * kBlockCost));
     if (current)
         current->linkBefore(element, nullptr);
     else
         root = adopt<Node>(element);
     current = element;
-}
-
-void DocumentParser::addAttributes(INewXmlParser* from, Element& element, const char** attributes)
-{
-    int count = 0;
-    while (attributes[count])
-        count++;
-    element.attributes.resize(count / 2);
-    for (int i = 0; i + 1 < count; i += 2)
-    {
-        const size_t nameLength = strlen(attributes[i]);
-        const size_t valueLength = strlen(attributes[i + 1]);
-        charge(from, sizeof(Attribute) + kBlockCost + wideCost(nameLength) + wideCost(valueLength));
-        // The place first, then the attribute in it: so no reference is counted up and down on the way.
-        if (!element.attributes.add(nullptr))
-            return;
-        auto* attribute = new Attribute;
-        element.attributes[i / 2] = adopt(attribute);
-        attribute->setSource({attributes[i], nameLength}, {attributes[i + 1], valueLength});
-    }
 }
 
 void DocumentParser::endTag(INewXmlParser*, const char*)

@@ -27,7 +27,6 @@ class DocumentParser : public XmlHandler
     void comment(INewXmlParser* from, const char* text) override;
 
 private:
-    void addAttributes(INewXmlParser* from, Element& element, const char** attributes);
     /// Stops the parser once the tree is too large.
     void charge(INewXmlParser* from, size_t bytes);
 

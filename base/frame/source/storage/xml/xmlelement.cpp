@@ -6,6 +6,8 @@
 #include "storage/xml/xmlelementdata.h"
 #include "storage/xml/xmltext.h"
 
+#include <cstring>
+
 namespace Xml
 {
 namespace
@@ -28,21 +30,41 @@ Element::~Element()
 
 bool Element::isNamed(const char16* text) const
 {
-    return source.isEmpty() ? name == text : isEqualText(source.first(), text);
+    return source.isEmpty() ? name == text : isEqualText(source.begin(), text);
 }
 
-void Element::setSource(std::string_view sourceName)
+size_t Element::setSource(const char* tag, const char** tagAttributes)
 {
-    if (source.set(sourceName) && !source.isAscii())
+    if (!source.set(tag, tagAttributes))
+        return 0;
+    const size_t size = source.size();
+    if (!source.isAscii())
         widen();
+    return size;
 }
 
 void Element::widen() const
 {
     if (source.isEmpty())
         return;
-    assignUtf8(name, source.first());
+    std::string_view text = source.begin();
+    const auto nextText = [&text] { return text = std::string_view(text.data() + text.size() + 1); };
+    assignUtf8(name, text);
+    attributes.resize(static_cast<int>(source.countAttributes()));
+    for (uint32 i = 0; i < source.countAttributes(); i++)
+    {
+        const auto attribute = adopt(new Attribute);
+        assignUtf8(attribute->name, nextText());
+        assignUtf8(attribute->value, nextText());
+        attributes.add(attribute);
+    }
     source.drop();
+}
+
+const TArray<IPtr<Attribute>>& Element::attributeList() const
+{
+    widen();
+    return attributes;
 }
 
 // The children of those children that go with this element are taken over, so that no destructor calls another one
@@ -171,11 +193,13 @@ Element* Element::firstElement(const char16* elementName) const
 
 bool Element::addAttribute(Attribute* attribute)
 {
+    widen();
     return attribute && attributes.add(attribute);
 }
 
 bool Element::removeAttribute(Attribute* attribute)
 {
+    widen();
     return attributes.remove(attribute);
 }
 
@@ -183,20 +207,20 @@ Attribute* Element::getAttribute(const char16* attributeName) const
 {
     if (!attributeName)
         return nullptr;
-    for (const IPtr<Attribute>& attribute : attributes)
-        if (attribute->isNamed(attributeName))
+    for (const IPtr<Attribute>& attribute : attributeList())
+        if (attribute->getName() == attributeName)
             return attribute;
     return nullptr;
 }
 
 Attribute* Element::attributeAt(int index) const
 {
-    return index >= 0 && index < attributes.total() ? attributes[index].get() : nullptr;
+    return attributeList().at(index);
 }
 
 int Element::countAttributes() const
 {
-    return attributes.total();
+    return source.isEmpty() ? attributes.total() : static_cast<int>(source.countAttributes());
 }
 
 // The pieces are judged one by one, as the tokenizer cut them: a line end between two lines is a piece of its own
@@ -322,7 +346,10 @@ bool Element::printTree(Buffer& out, IBStream* stream) const
 void Element::printStart(Buffer& out) const
 {
     out.put('<');
-    printName(out);
+    if (source.isEmpty())
+        appendUtf8(out, viewOf(name));
+    else
+        printSource(out);
     for (const IPtr<Attribute>& attribute : attributes)
     {
         out.put(' ');
@@ -339,15 +366,55 @@ void Element::printEnd(Buffer& out) const
     if (!first)
         return;
     out.put("</", 2);
-    printName(out);
-    out.put('>');
-}
-
-void Element::printName(Buffer& out) const
-{
     if (source.isEmpty())
         appendUtf8(out, viewOf(name));
     else
-        out.put(source.first().data(), static_cast<uint32>(source.first().size()));
+        appendText(out, source.begin());
+    out.put('>');
+}
+
+/// The tag's name and attributes.
+void Element::printSource(Buffer& out) const
+{
+    if (source.isPlain())
+        return printPlainSource(out);
+    const char* text = source.begin();
+    const auto next = [&text] { return text += strlen(text) + 1; };
+    appendText(out, text);
+    for (uint32 i = 0; i < source.countAttributes(); i++)
+    {
+        out.put(' ');
+        FXmlWriter::encodeString(out, next(), true);
+        out.put("=\"", 2);
+        FXmlWriter::encodeString(out, next(), true);
+        out.put('"');
+    }
+}
+
+// Each text loses its terminator; an attribute gets four characters around its two.
+void Element::printPlainSource(Buffer& out) const
+{
+    const uint32 before = out.getFillSize();
+    if (!out.setFillSize(before + source.size() - 1 + 2 * source.countAttributes()))
+        return;
+    const char* from = source.begin();
+    char* to = out + before;
+    const auto copy = [&from, &to]
+    {
+        const size_t length = strlen(from);
+        memcpy(to, from, length);
+        from += length + 1;
+        to += length;
+    };
+    copy();
+    for (uint32 i = source.countAttributes(); i > 0; i--)
+    {
+        *to++ = ' ';
+        copy();
+        *to++ = '=';
+        *to++ = '"';
+        copy();
+        *to++ = '"';
+    }
 }
 } // namespace Xml

@@ -71,9 +71,11 @@ private:
 
     /// Without a name.
     Element() : attributes(0, 4) {}
-    /// Takes the name as the parser gave it.
-    void setSource(std::string_view sourceName);
-    void printName(Buffer& out) const;
+    /// Takes the start tag as the parser gave it; gives its size in bytes.
+    size_t setSource(const char* tag, const char** tagAttributes);
+    const TArray<IPtr<Attribute>>& attributeList() const;
+    void printSource(Buffer& out) const;
+    void printPlainSource(Buffer& out) const;
     bool canAdopt(Node* child) const;
     void linkBefore(Node* child, Node* place);
     void unlink(Node* child);
@@ -89,7 +91,8 @@ private:
     Node* first = nullptr;
     Node* last = nullptr;
     int childCount = 0;
-    TArray<IPtr<Attribute>> attributes;
+    /// Empty, as the name is, while `source` isn't.
+    mutable TArray<IPtr<Attribute>> attributes;
     mutable SourceText source;
 };
 } // namespace Xml

@@ -26,13 +26,13 @@ bool ElementData::setData(const void* bytes, int length)
 const char* ElementData::getData() const
 {
     if (!source.isEmpty())
-        return source.first().data();
+        return source.begin();
     return getLength() > 0 ? data.str8() : "";
 }
 
 int ElementData::getLength() const
 {
-    return static_cast<int>(source.isEmpty() ? data.getFillSize() : source.first().size());
+    return static_cast<int>(source.isEmpty() ? data.getFillSize() : source.text().size());
 }
 
 bool ElementData::isFormatData() const
@@ -43,7 +43,7 @@ bool ElementData::isFormatData() const
 void ElementData::print(Buffer& out) const
 {
     if (!source.isEmpty() && source.isPlain())
-        out.put(source.first().data(), static_cast<uint32>(source.first().size()));
+        out.put(source.begin(), static_cast<uint32>(source.text().size()));
     else
         FXmlWriter::encodeString(out, getData(), true);
 }

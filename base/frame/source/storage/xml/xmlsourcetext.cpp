@@ -3,8 +3,6 @@
 #include "foundation/object/blockpool.h"
 #include "foundation/text/charwidth.h"
 
-#include <new>
-
 namespace Xml
 {
 namespace
@@ -22,39 +20,72 @@ bool hasMarkup(uint64 bytes)
 {
     return hasZero((bytes & 0xFB * kEach) ^ '"' * kEach) || hasZero((bytes & 0xFD * kEach) ^ '<' * kEach);
 }
+
+char* putText(char* to, std::string_view text)
+{
+    memcpy(to, text.data(), text.size());
+    to[text.size()] = 0;
+    return to + text.size() + 1;
+}
 } // namespace
 
 SourceText::SourceText(const SourceText& other)
 {
-    if (other.block)
-        set(other.first(), other.second());
+    if (!other.block || !make(other.size(), other.countAttributes()))
+        return;
+    memcpy(block->text(), other.begin(), other.size());
+    judge();
 }
 
-size_t SourceText::sizeFor(size_t firstLength, size_t secondLength)
+bool SourceText::set(std::string_view text)
 {
-    const size_t used = sizeof(Block) + firstLength + 1 + secondLength + 1;
-    return (used + sizeof(uint64) - 1) / sizeof(uint64) * sizeof(uint64);
+    if (!make(text.size() + 1, 0))
+        return false;
+    putText(block->text(), text);
+    judge();
+    return true;
 }
 
-bool SourceText::set(std::string_view first, std::string_view second)
+bool SourceText::set(const char* tag, const char** attributes)
+{
+    size_t size = strlen(tag) + 1;
+    size_t count = 0;
+    for (; attributes[count]; count++)
+        size += strlen(attributes[count]) + 1;
+    if (!make(size, count / 2))
+        return false;
+    char* to = putText(block->text(), tag);
+    for (size_t i = 0; i < count; i++)
+        to = putText(to, attributes[i]);
+    judge();
+    return true;
+}
+
+size_t SourceText::bytesFor(size_t size)
+{
+    return sizeof(Block) + (size + sizeof(uint64) - 1) / sizeof(uint64) * sizeof(uint64);
+}
+
+bool SourceText::make(size_t size, size_t attributes)
 {
     drop();
-    const size_t size = sizeFor(first.size(), second.size());
-    void* memory = second.size() > kMaxTextLength ? nullptr : BlockPool::take(size);
+    const size_t bytes = bytesFor(size);
+    auto* memory = size > kMaxTextLength ? nullptr : static_cast<char*>(BlockPool::take(bytes));
     if (!memory)
         return false;
-    block = new (memory)
-        Block{static_cast<uint32>(first.size()), static_cast<uint32>(second.size()) & kMaxTextLength, 0, 0};
-    char* const text = block->text();
-    char* const end = static_cast<char*>(memory) + size;
-    memset(end - sizeof(uint64), 0, sizeof(uint64));
-    memcpy(text, first.data(), first.size());
-    text[first.size()] = 0;
-    memcpy(text + first.size() + 1, second.data(), second.size());
+    memset(memory + bytes - sizeof(uint64), 0, sizeof(uint64));
+    block =
+        new (memory) Block{static_cast<uint32>(size), static_cast<uint32>(attributes) & kMaxTextLength, 0, 0};
+    return true;
+}
 
+/// Looks at eight bytes together.
+void SourceText::judge()
+{
     uint64 all = 0;
     bool isPlain = true;
-    for (const char* place = text; place < end; place += sizeof(uint64))
+    const char* const limit = reinterpret_cast<const char*>(block) + bytesFor(block->size);
+    for (const char* place = block->text(); place < limit; place += sizeof(uint64))
     {
         uint64 bytes = 0;
         memcpy(&bytes, place, sizeof(bytes));
@@ -63,13 +94,12 @@ bool SourceText::set(std::string_view first, std::string_view second)
     }
     block->isAscii = (all & kAboveAscii<char>) == 0;
     block->isPlain = isPlain;
-    return true;
 }
 
 void SourceText::drop()
 {
     if (block)
-        BlockPool::giveBack(block, sizeFor(block->firstLength, block->secondLength));
+        BlockPool::giveBack(block, bytesFor(block->size));
     block = nullptr;
 }
 } // namespace Xml

@@ -44,13 +44,6 @@ void appendUtf8(Buffer& out, std::u16string_view text)
         out.setFillSize(before + encodeUtf8(text.data(), length, out + before, '?'));
 }
 
-char* extend(Buffer& out, size_t count)
-{
-    const uint32 before = out.getFillSize();
-    const size_t size = before + count;
-    return size <= UINT32_MAX && out.setFillSize(static_cast<uint32>(size)) ? out + before : nullptr;
-}
-
 void appendText(Buffer& out, const char* text)
 {
     out.put(text, static_cast<uint32>(strlen(text)));

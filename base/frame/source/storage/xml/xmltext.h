@@ -33,13 +33,6 @@ inline bool isXmlSpace(char c)
 
 /// Appends the text in UTF-8, without a terminator and without entities.
 void appendUtf8(Buffer& out, std::u16string_view text);
-/// The place of as many more bytes, which count as filled; null where there is no memory.
-char* extend(Buffer& out, size_t count);
-/// Gives the place behind the copy.
-inline char* copyText(char* to, std::string_view text)
-{
-    return to + text.copy(to, text.size());
-}
 /// Appends an 8-bit text as it stands, without its terminator.
 void appendText(Buffer& out, const char* text);
 } // namespace Xml
