@@ -379,14 +379,14 @@ void Element::printSource(Buffer& out) const
     if (source.isPlain())
         return printPlainSource(out);
     const char* text = source.begin();
-    const auto next = [&text] { return text += strlen(text) + 1; };
+    const auto nextText = [&text] { return text += strlen(text) + 1; };
     appendText(out, text);
     for (uint32 i = 0; i < source.countAttributes(); i++)
     {
         out.put(' ');
-        FXmlWriter::encodeString(out, next(), true);
+        FXmlWriter::encodeString(out, nextText(), true);
         out.put("=\"", 2);
-        FXmlWriter::encodeString(out, next(), true);
+        FXmlWriter::encodeString(out, nextText(), true);
         out.put('"');
     }
 }
