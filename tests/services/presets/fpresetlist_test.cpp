@@ -244,6 +244,22 @@ TEST(FPreset, LeavesOutAnUnknownObjectThatLeadsBackToIt)
     EXPECT_EQ(StoredNode::alive, before) << "a circle would never be released";
 }
 
+TEST(FPreset, LeavesOutAnUnknownObjectThatLaterLeadsBackByAnother)
+{
+    const int before = StoredNode::alive;
+    {
+        FAttributes tree;
+        FPreset preset;
+        ASSERT_TRUE(load(presetOf(1) + object("FMultiPreset", 1, objects("Objects", {2, 3})) +
+                             object("FMissing", 2, objects("Objects", {3})) +
+                             object("FMultiPreset", 3, objects("Objects", {1, 4})) +
+                             object("StoredNode", 4, "<int name=\"Number\" value=\"8\"/>"),
+                         tree));
+        EXPECT_TRUE(preset.restoreAttributes(tree));
+    }
+    EXPECT_EQ(StoredNode::alive, before) << "a circle would never be released";
+}
+
 TEST(FPresetPointer, FollowsItsPreset)
 {
     UpdateHandler::instance();

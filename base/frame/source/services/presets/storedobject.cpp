@@ -25,7 +25,7 @@ IPtr<CmObject> keepStoredObject(CmObject* stored)
     {
         // Whoever holds the stored form of what leads to the holder is never released.
         const auto* reference = FCast(FXmlReference, stored);
-        return reference && !reference->countsTarget() ? nullptr : unknown;
+        return unknown->leadsBack() || (reference && !reference->countsTarget()) ? nullptr : unknown;
     }
     return resolveObject(stored, nullptr);
 }

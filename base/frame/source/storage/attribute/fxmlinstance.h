@@ -33,8 +33,12 @@ class FXmlInstance : public FXmlObject
     const char* getClassName() const { return className.text8(); }
     const char* getName() const { return name.text8(); }
     void setName(const char* text) { name.assign(text); }
+    /// Whether objects that this one refers to may come to hold what refers to it. Whoever keeps this stored form of
+    /// an object then, and is held by such an object, is never released. Known once the file is linked.
+    bool leadsBack() const { return isInCircle; }
 
 private:
+    friend class FXmlLinker;
     friend class FXmlReference;
 
     IPtr<CmObject> object;
@@ -44,4 +48,5 @@ private:
     FString name;
     /// References that don't count, to be emptied when this goes.
     std::vector<FXmlReference*> uncounted;
+    bool isInCircle = false;
 };

@@ -1,10 +1,24 @@
 #include "storage/attribute/fxmllinker.h"
 
+#include "foundation/object/classfactory.h"
+
 #include <algorithm>
 #include <unordered_map>
 
+namespace
+{
+/// An object that is never made only has its stored form, in which references that close a circle don't count.
+bool staysStored(const FXmlInstance* instance)
+{
+    const ClassFactory* factory = ClassFactory::instance(false);
+    return instance && *instance->getClassName() && factory &&
+           !factory->getMetaClassByName(instance->getClassName());
+}
+} // namespace
+
 /// Walks from object to object along the references, depth first, so that those which lead back to an object on the
-/// way from the start are known: these close a circle.
+/// way from the start are known: these close a circle. Objects from each of which one comes to each other, by however
+/// many references, are a circle too (a strongly connected component, found in Tarjan's way).
 class FXmlLinker::Walk
 {
 public:
@@ -21,16 +35,27 @@ private:
     };
     struct Node
     {
+        FXmlInstance* instance = nullptr;
+        /// In the order of the walk.
+        size_t number = 0;
+        /// The first object of the circle, as far as it is known.
+        size_t circle = 0;
+        bool isOpen = false;
         size_t nextLink = 0;
         size_t endLink = 0;
         State state = State::kUnvisited;
     };
 
+    void enter(Node& node, FXmlInstance* instance);
+    void leave(Node& node);
     void follow(Link& link);
 
     std::vector<Link>& links;
     std::unordered_map<FXmlInstance*, Node> nodes;
     std::vector<Node*> way;
+    /// What was visited and may still belong to a circle with an object on the way.
+    std::vector<Node*> open;
+    size_t visited = 0;
 };
 
 FXmlLinker::Walk::Walk(std::vector<Link>& sortedLinks) : links(sortedLinks)
@@ -49,8 +74,7 @@ void FXmlLinker::Walk::start(FXmlInstance* instance)
     Node& first = nodes[instance];
     if (first.state != State::kUnvisited)
         return;
-    first.state = State::kOnTheWay;
-    way.push_back(&first);
+    enter(first, instance);
     while (!way.empty())
     {
         Node& node = *way.back();
@@ -59,9 +83,36 @@ void FXmlLinker::Walk::start(FXmlInstance* instance)
             follow(links[node.nextLink++]);
             continue;
         }
-        node.state = State::kDone;
-        way.pop_back();
+        leave(node);
     }
+}
+
+void FXmlLinker::Walk::enter(Node& node, FXmlInstance* instance)
+{
+    node.instance = instance;
+    node.state = State::kOnTheWay;
+    node.number = node.circle = visited++;
+    node.isOpen = true;
+    way.push_back(&node);
+    open.push_back(&node);
+}
+
+void FXmlLinker::Walk::leave(Node& node)
+{
+    node.state = State::kDone;
+    way.pop_back();
+    if (!way.empty())
+        way.back()->circle = std::min(way.back()->circle, node.circle);
+    if (node.circle < node.number)
+        return;
+    while (open.back() != &node)
+    {
+        open.back()->isOpen = false;
+        open.back()->instance->isInCircle = true;
+        open.pop_back();
+    }
+    node.isOpen = false;
+    open.pop_back();
 }
 
 void FXmlLinker::Walk::follow(Link& link)
@@ -70,10 +121,10 @@ void FXmlLinker::Walk::follow(Link& link)
         return;
     Node& node = nodes[link.target];
     link.reference->setTarget(link.target, node.state != State::kOnTheWay);
-    if (node.state != State::kUnvisited)
-        return;
-    node.state = State::kOnTheWay;
-    way.push_back(&node);
+    if (node.state == State::kUnvisited)
+        return enter(node, link.target);
+    if (node.isOpen && (node.state == State::kDone || !staysStored(link.holder)))
+        way.back()->circle = std::min(way.back()->circle, node.number);
 }
 
 void FXmlLinker::addInstance(FXmlInstance* instance)
