@@ -44,12 +44,10 @@ const char* findEnd(const char* begin, const char* limit, Predicate isEnd)
     return begin;
 }
 
-bool endsTagName(char c)
-{
-    return Xml::isXmlSpace(c) || c == '/' || c == '>';
-}
-
 // Calculated without conditions, so that they fit in wide registers.
+
+/// Whether it ends the name of a tag or is one of those that a name doesn't have.
+constexpr auto endsTagName = [](uint8 c) -> uint8 { return (c <= ' ') | (c == '/') | (c == '>'); };
 
 /// Whether it ends the name of an attribute or is one of those that a name doesn't have.
 constexpr auto endsName = [](uint8 c) -> uint8 { return (c <= ' ') | (c == '='); };
@@ -129,8 +127,9 @@ bool FXmlParser::takePlainTagName()
     const char* const limit = buffer + buffer.getFillSize();
     if (limit - begin < 2 || begin[0] != '<' || begin[1] == '!' || begin[1] == '/' || begin[1] == '?')
         return false;
-    const char* const end = std::find_if(begin + 1, limit, endsTagName);
-    if (end == limit || end - begin > kMaxToken)
+    const char* const end = findEnd(begin + 1, limit, endsTagName);
+    const bool isEnd = end < limit && (Xml::isXmlSpace(*end) || *end == '/' || *end == '>');
+    if (!isEnd || end - begin > kMaxToken)
         return false;
     const auto length = static_cast<size_t>(end - begin - 1);
     memcpy(tagName.ptr(), begin + 1, length);
@@ -157,8 +156,10 @@ bool FXmlParser::takePlainEndTag()
 {
     const char* const begin = buffer + bufferPos;
     const char* const limit = buffer + buffer.getFillSize();
+    if (limit - begin < 3 || begin[0] != '<' || begin[1] != '/')
+        return false;
     const auto* name = static_cast<CmString*>(tagStack.peek());
-    if (!name || limit - begin < 3 || begin[0] != '<' || begin[1] != '/')
+    if (!name)
         return false;
     const char* const end = begin + 2 + name->length();
     if (limit <= end || *end != '>' || memcmp(begin + 2, name->text8(), name->length()) != 0)
@@ -220,10 +221,13 @@ FXmlAttribute* FXmlParser::takePlainAttribute(const char*& place, const char* li
         *equals != '=' || (equals[1] != '"' && equals[1] != '\''))
         return nullptr;
     const char* const value = equals + 2;
-    const char* end = findEnd(value, limit, endsValue);
-    const bool hasReferences = end < limit && *end == '&';
-    while (end < limit && *end == '&')
-        end = findEnd(end + 1, limit, endsValue);
+    const char* end = value;
+    bool hasReferences = false;
+    while ((end = findEnd(end, limit, endsValue)) < limit && *end == '&')
+    {
+        hasReferences = true;
+        end++;
+    }
     if (end == limit || *end != equals[1] || equals - begin > kMaxAttributeName ||
         end - value > kMaxAttributeValue)
         return nullptr;

@@ -97,6 +97,11 @@ bool isBlank(char c)
     return c == ' ' || c == '\t';
 }
 
+bool isLineEnd(char c)
+{
+    return c == '\r' || c == '\n';
+}
+
 /// The byte that ends a run, where there is only one.
 struct Is
 {
@@ -144,12 +149,17 @@ void FXmlParser::skipLayout(bool areBlanksData)
     {
         const char* place = buffer + bufferPos;
         const char* const limit = buffer + buffer.getFillSize();
-        while (!areBlanksData && place < limit && isBlank(*place))
-            place++;
+        for (; place < limit; place++)
+        {
+            const bool isLine = isLineEnd(*place) && place + 1 < limit && !isLineEnd(place[1]);
+            if (!isLine && (areBlanksData || !isBlank(*place)))
+                break;
+            line += isLine ? 1 : 0;
+        }
         bufferPos = static_cast<uint32>(place - buffer.ptr());
         if (place == limit)
             continue;
-        if (*place != '\r' && *place != '\n')
+        if (!isLineEnd(*place))
             return;
         skipLineEnd();
     }

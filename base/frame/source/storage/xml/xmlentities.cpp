@@ -97,7 +97,7 @@ uint8 decodeNumber(const char* digits, int length, unsigned base)
 
 bool isName(const char* entityName, const char* name, size_t length)
 {
-    return strncmp(entityName, name, length) == 0 && entityName[length] == 0;
+    return *entityName == *name && strncmp(entityName, name, length) == 0 && entityName[length] == 0;
 }
 } // namespace
 
