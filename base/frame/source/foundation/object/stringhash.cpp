@@ -13,7 +13,7 @@ namespace
 // power of four, or by the remainder of that, which leaves more room.
 constexpr unsigned kLargestShared = 1u << 25;
 constexpr unsigned kGroup = 4;
-constexpr uint64 kBehindGroup = uint64{1} << 6 * kGroup;
+constexpr uint32 kBehindGroup = uint32{1} << 6 * kGroup;
 
 uint32 widened(char character)
 {

@@ -136,10 +136,15 @@ Char* String::extend(unsigned count)
     const std::size_t newLength = std::size_t{len} + count;
     if (newLength > kMaxTextLength)
         return nullptr;
-    void* longer = std::realloc(buffer, (newLength + 1) * sizeof(Char));
-    if (!longer)
-        return nullptr;
-    buffer = longer;
+    // Blocks come in steps of some characters: one that is large enough as it is would come back unchanged.
+    const std::size_t size = (newLength + 1) * sizeof(Char);
+    if (size > blockSizeOf(buffer))
+    {
+        void* longer = std::realloc(buffer, size);
+        if (!longer)
+            return nullptr;
+        buffer = longer;
+    }
     Char* place = chars<Char>() + len;
     place[count] = 0;
     len = static_cast<unsigned>(newLength) & kMaxTextLength;
