@@ -15,12 +15,12 @@ bool cmpObjs(const CmObject* left, const CmObject* right)
     return left->compare(right) < 0;
 }
 
-/// The places that are asked of the system: up to an eighth more than `places`, so that an array with a small step
+/// The places that are asked of the system: up to a quarter more than `places`, so that an array with a small step
 /// isn't moved at each of them.
 int roomFor(int places)
 {
     const unsigned wanted = static_cast<unsigned>(places);
-    const unsigned step = std::max(std::bit_floor(wanted) / 8, 1u);
+    const unsigned step = std::max(std::bit_floor(wanted) / 4, 1u);
     const unsigned rounded = (wanted + step - 1) / step * step;
     return static_cast<int>(std::min(rounded, static_cast<unsigned>(INT_MAX)));
 }
