@@ -378,15 +378,22 @@ void Element::printSource(Buffer& out) const
 {
     if (source.isPlain())
         return printPlainSource(out);
-    const char* text = source.begin();
-    const auto nextText = [&text] { return text += strlen(text) + 1; };
-    appendText(out, text);
+    std::string_view text = source.begin();
+    const auto appendNext = [this, &out, &text]
+    {
+        text = std::string_view(text.data() + text.size() + 1);
+        if (source.isPlain(text))
+            out.put(text.data(), static_cast<uint32>(text.size()));
+        else
+            FXmlWriter::encodeString(out, text.data(), true);
+    };
+    out.put(text.data(), static_cast<uint32>(text.size()));
     for (uint32 i = 0; i < source.countAttributes(); i++)
     {
         out.put(' ');
-        FXmlWriter::encodeString(out, nextText(), true);
+        appendNext();
         out.put("=\"", 2);
-        FXmlWriter::encodeString(out, nextText(), true);
+        appendNext();
         out.put('"');
     }
 }

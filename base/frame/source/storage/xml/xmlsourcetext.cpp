@@ -3,6 +3,8 @@
 #include "foundation/object/blockpool.h"
 #include "foundation/text/charwidth.h"
 
+#include <cstddef>
+
 namespace Xml
 {
 namespace
@@ -94,6 +96,22 @@ void SourceText::judge()
     }
     block->isAscii = (all & kAboveAscii<char>) == 0;
     block->isPlain = isPlain;
+}
+
+bool SourceText::isPlain(std::string_view text) const
+{
+    const char* const limit = reinterpret_cast<const char*>(block) + bytesFor(block->size);
+    const char* const textEnd = text.data() + text.size();
+    uint64 bytes = 0;
+    for (const char* place = text.data(); place < textEnd; place += sizeof(bytes))
+    {
+        if (limit - place < static_cast<std::ptrdiff_t>(sizeof(bytes)))
+            return false;
+        memcpy(&bytes, place, sizeof(bytes));
+        if (hasMarkup(bytes))
+            return false;
+    }
+    return true;
 }
 
 void SourceText::drop()

@@ -38,6 +38,8 @@ public:
     bool isAscii() const { return block->isAscii; }
     /// Whether no character has to be written by name.
     bool isPlain() const { return block->isPlain; }
+    /// The same for one of the texts. At times false where only a character behind it has to.
+    bool isPlain(std::string_view text) const;
 
 private:
     /// The texts follow, and then zeros up to a multiple of eight bytes.
