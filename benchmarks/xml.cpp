@@ -110,7 +110,8 @@ void parseByPugixml(benchmark::State& state)
 }
 
 // The document. Dropping the tree isn't part of the time; it is a case of its own. What was dropped goes back to the
-// system, so that each round begins as a fresh process does and not with the sorting of a hundred thousand free blocks.
+// system, so that no round begins with the sorting of a hundred thousand free blocks; what came from the pool of small
+// blocks stays with it, so only the first round touches all pages anew.
 
 void loadDocument(benchmark::State& state)
 {

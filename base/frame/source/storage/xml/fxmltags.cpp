@@ -47,7 +47,12 @@ const char* findEnd(const char* begin, const char* limit, Predicate isEnd)
 // Calculated without conditions, so that they fit in wide registers.
 
 /// Whether it ends the name of a tag or is one of those that a name doesn't have.
-constexpr auto endsTagName = [](uint8 c) -> uint8 { return (c <= ' ') | (c == '/') | (c == '>'); };
+constexpr auto endsTagName = [](uint8 c) -> uint8
+{
+    const auto fromSlash = static_cast<uint8>(c ^ '/');
+    const auto fromEnd = static_cast<uint8>(c ^ '>');
+    return (c <= ' ') | (std::min(fromSlash, fromEnd) == 0);
+};
 
 /// Whether it ends the name of an attribute or is one of those that a name doesn't have.
 constexpr auto endsName = [](uint8 c) -> uint8 { return (c <= ' ') | (c == '='); };
