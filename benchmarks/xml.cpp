@@ -7,6 +7,7 @@
 #include "storage/xml/fxmlparser.h"
 #include "storage/xml/fxmlparser2.h"
 #include "storage/xml/xmldocument.h"
+#include "storage/xml/xmlelement.h"
 #include "storage/xml/xmlhandler.h"
 
 #include <benchmark/benchmark.h>
@@ -113,6 +114,19 @@ void parseByPugixml(benchmark::State& state)
 // system, so that no round begins with the sorting of a hundred thousand free blocks; what came from the pool of small
 // blocks stays with it, so only the first round touches all pages anew.
 
+/// Asks for all names and values, which are made only then.
+void askForAll(const Xml::Element* element)
+{
+    for (; element; element = element->nextElement())
+    {
+        benchmark::DoNotOptimize(element->getName().length());
+        for (int i = 0; i < element->countAttributes(); i++)
+            benchmark::DoNotOptimize(element->attributeAt(i)->getValue().length());
+        askForAll(element->firstElement());
+    }
+}
+
+template <bool askToo>
 void loadDocument(benchmark::State& state)
 {
     for (auto _ : state)
@@ -120,6 +134,8 @@ void loadDocument(benchmark::State& state)
         auto document = std::make_unique<Xml::Document>();
         if (!document->load(adopt(openInput(inputOf(state)))))
             state.SkipWithError("not loaded");
+        if (askToo)
+            askForAll(document->getRootElement());
         state.PauseTiming();
         document.reset();
         malloc_trim(0);
@@ -157,10 +173,13 @@ void loadAndDropByLibxml2(benchmark::State& state)
 
 using LoadFunction = void (*)(const std::string& text);
 
+template <bool askToo>
 void keepDocument(const std::string& text)
 {
     auto* document = new Xml::Document;
     document->load(adopt(openInput(text)));
+    if (askToo)
+        askForAll(document->getRootElement());
 }
 
 void keepDocumentOfLibxml2(const std::string& text)
@@ -202,6 +221,7 @@ struct Memory
     double skin = 0;
 };
 Memory ours;
+Memory oursAsked;
 Memory libxml2;
 
 Memory measureTrees(LoadFunction load)
@@ -266,19 +286,24 @@ BOTH_FILES(newerParser, "newer parser/ours");
 BOTH_FILES(rawExpat, "newer parser/expat");
 BOTH_FILES(olderParser, "older parser/ours");
 BOTH_FILES(parseByPugixml, "older parser/pugixml");
-BOTH_FILES(loadDocument, "document load/ours");
+BOTH_FILES(loadDocument<false>, "document load/ours");
 BOTH_FILES(rawExpat, "document load/expat");
+BOTH_FILES(loadDocument<true>, "document load, all asked for/ours");
+BOTH_FILES(rawExpat, "document load, all asked for/expat");
 BOTH_FILES(loadAndDropDocument, "document load and drop/ours");
 BOTH_FILES(loadAndDropByLibxml2, "document load and drop/libxml2");
 BOTH_FILES(showMemory<&ours>, "document memory/ours")->Iterations(1);
 BOTH_FILES(showMemory<&libxml2>, "document memory/libxml2")->Iterations(1);
+BOTH_FILES(showMemory<&oursAsked>, "document memory, all asked for/ours")->Iterations(1);
+BOTH_FILES(showMemory<&libxml2>, "document memory, all asked for/libxml2")->Iterations(1);
 BOTH_FILES(saveDocument, "document save/ours");
 BOTH_FILES(saveByPugixml, "document save/pugixml");
 
 int main(int argc, char** argv)
 {
     // The processes that measure memory begin as this one is now.
-    ours = measureTrees(keepDocument);
+    ours = measureTrees(keepDocument<false>);
+    oursAsked = measureTrees(keepDocument<true>);
     libxml2 = measureTrees(keepDocumentOfLibxml2);
     benchmark::Initialize(&argc, argv);
     benchmark::RunSpecifiedBenchmarks();
