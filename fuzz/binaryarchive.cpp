@@ -29,11 +29,7 @@ void loadRoots(const std::string& bytes)
     FMemoryStream stream(const_cast<char*>(bytes.data()), static_cast<int64>(bytes.size()));
     FBinArchive archive(&stream, false);
     archive.load();
-    for (const char* name : {"a", "b"})
-    {
-        archive.getRoot(name, "FAttributes");
-        archive.getGlobalRoot(name, "CmObject");
-    }
+    askForRoots(archive);
 }
 } // namespace
 

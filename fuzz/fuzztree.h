@@ -1,6 +1,7 @@
 #pragma once
 
 #include "fuzz/fuzztext.h"
+#include "storage/archive/fattributearchivebase.h"
 #include "storage/attribute/fattributes.h"
 #include "storage/attribute/fxmlobject.h"
 #include "storage/stream/fmemorystream.h"
@@ -25,5 +26,15 @@ inline void touchObjects(FAttributes& tree, int depth = 0)
             touchObjects(*queued, depth + 1);
         while (CmObject* object = tree.unqueueObject(key.c_str(), nullptr))
             object->release();
+    }
+}
+
+/// Asks for the roots "a" and "b", which makes their objects.
+inline void askForRoots(FAttributeArchiveBase& archive)
+{
+    for (const char* name : {"a", "b"})
+    {
+        archive.getRoot(name, "FAttributes");
+        archive.getGlobalRoot(name, "CmObject");
     }
 }

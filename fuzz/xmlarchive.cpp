@@ -30,11 +30,7 @@ void loadRoots(const std::string& text, bool windowsEntities)
     FMemoryStream stream(const_cast<char*>(text.data()), static_cast<int64>(text.size()));
     FXmlArchive archive(&stream, false);
     archive.load(kRoot, nullptr, windowsEntities);
-    for (const char* name : {"a", "b"})
-    {
-        archive.getRoot(name, "FAttributes");
-        archive.getGlobalRoot(name, "CmObject");
-    }
+    askForRoots(archive);
 }
 } // namespace
 
