@@ -26,8 +26,8 @@ public:
         double total = 0; ///< to send; 0 until that is known
         double sent = 0;  ///< given to the connection
         double received = 0;
-        int untaken =
-            0; ///< given to the connection, and not yet with the other side; -1 where that can't be told
+        /// Given to the connection, and not yet with the other side; -1 where that can't be told.
+        int untaken = 0;
 
         bool operator==(const Bytes& other) const = default;
     };
