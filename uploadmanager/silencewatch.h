@@ -5,8 +5,9 @@
 
 /// Tells that a transfer has come to a standstill: for too long no byte went out, was taken by the other side or came in.
 ///
-/// It is shown the transfer about once a second. Of the time between two looks no more than that counts, since the process
-/// may have been stopped meanwhile, or a question been up. A transfer begins with a new watch. One thread at a time.
+/// It is shown the transfer once or twice a second. Of a longer time between two looks only two seconds count, since the
+/// process may have been stopped meanwhile, or a question been up. A transfer begins with a new watch. One thread at a
+/// time.
 class SilenceWatch
 {
 public:
@@ -40,11 +41,16 @@ public:
         kNetworkSilent
     };
 
+    /// Whether it is time to look again: to find out what is untaken costs a system call, and while a transfer moves it
+    /// can be looked at thousands of times a second.
+    bool isDue(Time now) const { return !lastLook || now - *lastLook >= kPause; }
     Verdict look(const Bytes& bytes, Time now);
     /// As the last look has it.
     bool isNetworkSilent() const { return verdict == Verdict::kNetworkSilent; }
 
 private:
+    static constexpr std::chrono::milliseconds kPause{500};
+
     Verdict judge() const;
 
     Bytes seen;

@@ -41,8 +41,11 @@ int takeSocket(void* data, curl_socket_t socket, curlsocktype)
 
 SilenceWatch::Verdict watch(CallbackData& data, double total, double sent, double received)
 {
+    const auto now = std::chrono::steady_clock::now();
+    if (!data.silence.isDue(now))
+        return SilenceWatch::Verdict::kMoving;
     const SilenceWatch::Bytes bytes = {total, sent, received, PlatformServices::unsentBytes(data.socket)};
-    return data.silence.look(bytes, std::chrono::steady_clock::now());
+    return data.silence.look(bytes, now);
 }
 
 // A file that can't be read on, or has become shorter, ends there for libcurl, which then waits for the reply to more

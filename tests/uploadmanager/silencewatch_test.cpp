@@ -84,3 +84,11 @@ TEST_F(Silence, CountsNoTimeInWhichNobodyLooked)
     now += 10h;
     EXPECT_EQ(pass({1000, 500, 0, 0}, 1s), Verdict::kMoving);
 }
+
+TEST_F(Silence, IsNotLookedForAtEveryCall)
+{
+    EXPECT_TRUE(watch.isDue(now));
+    watch.look({1000, 500, 0, 20}, now);
+    EXPECT_FALSE(watch.isDue(now + 100ms));
+    EXPECT_TRUE(watch.isDue(now + 900ms)) << "a second may be cut a little short";
+}
