@@ -1,8 +1,5 @@
 #include "containers/keyed/cmhashtable.h"
 
-#include "containers/keyed/cmassociation.h"
-#include "foundation/text/cmstring.h"
-
 #include <climits>
 #include <cstdlib>
 #include <utility>
@@ -27,32 +24,11 @@ void append(CmHashBucket& bucket, CmHashNode* node)
     bucket.count++;
 }
 
-/// What `isA` gives for objects of this very class, and for none derived from it, which might compare in another way.
-template <class Class>
-const char* exactName()
+CmHashNode* findEqual(CmHashNode* node, const CmObject* object)
 {
-    static const char* const name = Class().isA();
-    return name;
-}
-
-/// The text that is to be hashed: the object itself, or the key of an association. Null for what is no plain text.
-const CmString* textOf(const CmObject* object)
-{
-    const char* name = object->isA();
-    if (name == exactName<CmAssociation>())
-    {
-        object = static_cast<const CmAssociation*>(object)->getKey();
-        name = object ? object->isA() : nullptr;
-    }
-    return name == exactName<CmString>() ? static_cast<const CmString*>(object) : nullptr;
-}
-
-/// Most texts that share a bucket are told apart by their marks, without a look at them.
-bool isEqualTo(const CmHashNode* node, const CmObject* object, uint32 mark)
-{
-    if (node->mark != mark && node->mark != 0 && mark != 0)
-        return false;
-    return node->object->isEqual(object);
+    while (node && !node->object->isEqual(object))
+        node = node->next;
+    return node;
 }
 } // namespace
 
@@ -89,9 +65,7 @@ bool CmHashTable::resize(int newSize)
         for (CmHashNode* node = _buckets[i].first; node;)
         {
             CmHashNode* moved = std::exchange(node, node->next);
-            const TextHash place = placeOf(moved->object, newSize);
-            moved->mark = place.mark;
-            append(buckets[place.bucket], moved);
+            append(buckets[bucketNumber(moved->object, newSize)], moved);
             _total++;
         }
     free(std::exchange(_buckets, buckets));
@@ -104,19 +78,19 @@ bool CmHashTable::add(CmObject* object)
     if (!object || _size == 0)
         return false;
     growIfCrowded();
-    return addAt(placeOf(object, _size), object);
+    return addTo(*bucketOf(object), object);
 }
 
 bool CmHashTable::addUnique(CmObject* object)
 {
     if (!object || _size == 0)
         return false;
-    TextHash place = placeOf(object, _size);
-    if (find(object, place))
+    CmHashBucket* bucket = bucketOf(object);
+    if (findEqual(bucket->first, object))
         return false;
     if (growIfCrowded())
-        place = placeOf(object, _size);
-    return addAt(place, object);
+        bucket = bucketOf(object);
+    return addTo(*bucket, object);
 }
 
 bool CmHashTable::growIfCrowded()
@@ -125,9 +99,9 @@ bool CmHashTable::growIfCrowded()
            resize(_size * kGrowthFactor);
 }
 
-bool CmHashTable::addAt(const TextHash& place, CmObject* object)
+bool CmHashTable::addTo(CmHashBucket& bucket, CmObject* object)
 {
-    append(_buckets[place.bucket], new CmHashNode{nullptr, object, place.mark});
+    append(bucket, new CmHashNode{nullptr, object});
     _total++;
     testRemember(object);
     return true;
@@ -144,11 +118,10 @@ CmObject* CmHashTable::takeEqual(const CmObject* object)
 {
     if (!object || _size == 0)
         return nullptr;
-    const TextHash place = placeOf(object, _size);
-    CmHashBucket& bucket = _buckets[place.bucket];
+    CmHashBucket& bucket = *bucketOf(object);
     CmHashNode* predecessor = nullptr;
     for (CmHashNode* node = bucket.first; node; predecessor = node, node = node->next)
-        if (isEqualTo(node, object, place.mark))
+        if (node->object->isEqual(object))
             return unlink(bucket, predecessor, node);
     return nullptr;
 }
@@ -194,7 +167,7 @@ bool CmHashTable::containsAbs(const CmObject* object) const
 {
     if (!object || _size == 0)
         return false;
-    const CmHashNode* node = _buckets[placeOf(object, _size).bucket].first;
+    const CmHashNode* node = bucketOf(object)->first;
     while (node && node->object != object)
         node = node->next;
     return node != nullptr;
@@ -218,25 +191,18 @@ CmHashNode* CmHashTable::find(const CmObject* object) const
 {
     if (!object || _size == 0)
         return nullptr;
-    return find(object, placeOf(object, _size));
+    return findEqual(bucketOf(object)->first, object);
 }
 
-CmHashNode* CmHashTable::find(const CmObject* object, const TextHash& place) const
+CmHashBucket* CmHashTable::bucketOf(const CmObject* object) const
 {
-    CmHashNode* node = _buckets[place.bucket].first;
-    while (node && !isEqualTo(node, object, place.mark))
-        node = node->next;
-    return node;
+    return &_buckets[bucketNumber(object, _size)];
 }
 
-TextHash CmHashTable::placeOf(const CmObject* object, int size) const
+unsigned CmHashTable::bucketNumber(const CmObject* object, int size) const
 {
     const unsigned count = static_cast<unsigned>(size);
-    if (_hashFunction)
-        return {_hashFunction(object, count), 0};
-    if (const CmString* text = textOf(object))
-        return text->hashAndMark(count);
-    return {object->hash(count), 0};
+    return _hashFunction ? _hashFunction(object, count) : object->hash(count);
 }
 
 CmObject* CmHashTable::unlink(CmHashBucket& bucket, CmHashNode* predecessor, CmHashNode* node)

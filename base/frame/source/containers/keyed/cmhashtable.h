@@ -2,7 +2,6 @@
 
 #include "containers/sequence/cmcontainer.h"
 #include "containers/sequence/cmiterator.h"
-#include "foundation/object/stringhash.h"
 
 /// A place in a chain of a CmHashTable.
 struct CmHashNode
@@ -11,8 +10,6 @@ struct CmHashNode
 
     CmHashNode* next;
     CmObject* object;
-    /// That of a text, or of the text that is the key of an association, as it was when it was hashed; else 0.
-    uint32 mark;
 };
 
 /// A bucket of a CmHashTable: a chain in the order of insertion.
@@ -77,12 +74,11 @@ protected:
 private:
     friend class CmHashTableIterator;
 
-    /// Where an object belongs in a table of `size` buckets, and its mark.
-    TextHash placeOf(const CmObject* object, int size) const;
-    CmHashNode* find(const CmObject* object, const TextHash& place) const;
+    CmHashBucket* bucketOf(const CmObject* object) const;
+    unsigned bucketNumber(const CmObject* object, int size) const;
     /// Whether the number of buckets has changed.
     bool growIfCrowded();
-    bool addAt(const TextHash& place, CmObject* object);
+    bool addTo(CmHashBucket& bucket, CmObject* object);
     /// `predecessor` is null for the first of a chain. Gives the object, whose reference is then the caller's.
     CmObject* unlink(CmHashBucket& bucket, CmHashNode* predecessor, CmHashNode* node);
 
