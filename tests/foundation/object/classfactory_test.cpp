@@ -268,21 +268,6 @@ TEST(StringHash, TakesTheRemainderBehindEveryCharacter)
     }
 }
 
-TEST(StringHash, MarksEqualTextsAlike)
-{
-    const std::string narrow = "a name of both widths";
-    const std::u16string wide(narrow.begin(), narrow.end());
-    int shared = 0;
-    for (size_t length = 1; length <= narrow.size(); length++)
-    {
-        EXPECT_EQ(hashString8(narrow.c_str(), length, 7).mark, hashString16(wide.c_str(), length, 7).mark);
-        if (hashString8(narrow.c_str(), length, 7).mark == hashString8(narrow.c_str(), length - 1, 7).mark)
-            shared++;
-    }
-    EXPECT_EQ(shared, 0) << "what tells nothing apart is no mark";
-    EXPECT_EQ(hashString8("\xC4pfel", 5, 7).mark, 0u) << "of other characters in 16 bits";
-}
-
 TEST(CmDelegatingUnknown, AnswersForItsDelegate)
 {
     auto* component = new Component;

@@ -79,12 +79,12 @@ bool hasNegative(Group<Character> group)
 }
 
 template <class Character>
-TextHash hashText(const Character* text, size_t length, unsigned size)
+unsigned hashText(const Character* text, size_t length, unsigned size)
 {
     if (size == 0 || length == 0)
-        return {0, 0};
+        return 0;
     if (size > kLargestShared || std::endian::native != std::endian::little)
-        return {hashByRule(text, length, size), 0};
+        return hashByRule(text, length, size);
     const uint64 factor = kBehindGroup % size;
     const uint64 largestHash = ~uint64{0} >> (1 + std::bit_width(size));
     const size_t first = (length - 1) % kGroup + 1;
@@ -100,27 +100,27 @@ TextHash hashText(const Character* text, size_t length, unsigned size)
         hash = hash * factor + sumOf<Character>(group);
     }
     if (hasNegative<Character>(all))
-        return {hashByRule(text, length, size), 0};
-    return {static_cast<unsigned>(hash % size), static_cast<uint32>(hash ^ hash >> 32)};
+        return hashByRule(text, length, size);
+    return static_cast<unsigned>(hash % size);
 }
 } // namespace
 
 unsigned hashString8(const char* text, unsigned size)
 {
-    return text ? hashString8(text, strlen(text), size).bucket : 0;
+    return text ? hashString8(text, strlen(text), size) : 0;
 }
 
 unsigned hashString16(const char16* text, unsigned size)
 {
-    return text ? hashString16(text, std::char_traits<char16>::length(text), size).bucket : 0;
+    return text ? hashString16(text, std::char_traits<char16>::length(text), size) : 0;
 }
 
-TextHash hashString8(const char* text, size_t length, unsigned size)
+unsigned hashString8(const char* text, size_t length, unsigned size)
 {
     return hashText(text, length, size);
 }
 
-TextHash hashString16(const char16* text, size_t length, unsigned size)
+unsigned hashString16(const char16* text, size_t length, unsigned size)
 {
     return hashText(text, length, size);
 }

@@ -1,6 +1,7 @@
 #include "foundation/text/cmstring.h"
 
 #include "foundation/object/fastcast.h"
+#include "foundation/object/stringhash.h"
 
 #include <cstring>
 
@@ -24,11 +25,6 @@ int CmString::compare(const CmObject* other) const
 }
 
 unsigned CmString::hash(unsigned size) const
-{
-    return hashAndMark(size).bucket;
-}
-
-TextHash CmString::hashAndMark(unsigned size) const
 {
     return isWide ? hashString16(static_cast<const char16*>(buffer), len, size)
                   : hashString8(static_cast<const char*>(buffer), len, size);

@@ -1,7 +1,6 @@
 #pragma once
 
 #include "foundation/object/cmobject.h"
-#include "foundation/object/stringhash.h"
 #include "foundation/text/fstring.h"
 #include "foundation/text/ttextobject.h"
 
@@ -32,8 +31,6 @@ class CmString : public TTextObject<CmObject, FString>
     bool isEqual(const CmObject* other) const override;
     int compare(const CmObject* other) const override;
     unsigned hash(unsigned size) const override;
-    /// The same, and what tells apart most texts that share it.
-    TextHash hashAndMark(unsigned size) const;
     bool internalize(FArchive& archive) override;
     bool externalize(FArchive& archive) const override;
     bool storeAttributes(FAttributes& attributes) const override;
