@@ -58,6 +58,30 @@ TEST(Comparison, GivesTheDifferenceOfWideCharacters)
     EXPECT_EQ(ConstString(u"ÄB").compare(u"äc", kCaseInsensitive), -1);
 }
 
+TEST(Comparison, FindsADifferenceAtEachPlaceOfEachLength)
+{
+    const std::u16string text = u"Item 0\U0001F600\u00E4\uFFFD\u01003x";
+    for (std::size_t length = 1; length <= text.size(); length++)
+    {
+        const std::u16string whole = text.substr(0, length);
+        EXPECT_EQ(ConstString(whole.c_str()).compare(String(whole.c_str())), 0);
+        for (std::size_t place = 0; place < length; place++)
+        {
+            // What follows the difference would give another result, and so would a byte of it alone.
+            std::u16string other = whole;
+            other.back() = u'\u0001';
+            other[place] = static_cast<char16>(whole[place] + 0xFF);
+            EXPECT_EQ(ConstString(whole.c_str()).compare(other.c_str()), whole[place] - other[place])
+                << place;
+            EXPECT_EQ(ConstString(other.c_str()).compare(whole.c_str()), other[place] - whole[place])
+                << place;
+            const std::u16string start = whole.substr(0, place);
+            EXPECT_EQ(ConstString(start.c_str()).compare(whole.c_str()), -1);
+            EXPECT_GT(ConstString(whole.c_str()).compare(start.c_str()), 0);
+        }
+    }
+}
+
 TEST(Comparison, ComparesWhatStandsBehindAnIndex)
 {
     EXPECT_EQ(ConstString("file.xml").compareAt(4, ".xml"), 0);

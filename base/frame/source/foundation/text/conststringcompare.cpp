@@ -5,6 +5,7 @@
 #include "foundation/text/string.h"
 
 #include <algorithm>
+#include <bit>
 #include <cstring>
 
 namespace
@@ -44,19 +45,53 @@ int compareNarrow(const char* a, const char* b, int count, CompareMode mode)
     return mode == kCaseSensitive ? std::strncmp(a, b, limit) : compareFolded(a, b, limit);
 }
 
-/// `lengthA` and `lengthB` are cut to the limit of the comparison.
-int compareWide(const char16* a, unsigned lengthA, const char16* b, unsigned lengthB, CompareMode mode)
+/// Four characters, as the number that they are in memory.
+uint64 fourCharacters(const char16* text)
 {
-    if (mode == kCaseInsensitive)
-        return ITextServices::instance().compareIgnoringCase(a, lengthA, b, lengthB);
-    const unsigned common = std::min(lengthA, lengthB);
-    const char16* end = std::mismatch(a, a + common, b).first;
-    const auto same = static_cast<unsigned>(end - a);
-    if (same < common)
+    uint64 word;
+    std::memcpy(&word, text, sizeof word);
+    return word;
+}
+
+/// The place of the first of four characters that differs.
+unsigned firstDifferentOfFour(uint64 difference)
+{
+    const int zeroBits = std::endian::native == std::endian::little ? std::countr_zero(difference)
+                                                                    : std::countl_zero(difference);
+    return static_cast<unsigned>(zeroBits) / 16;
+}
+
+/// The place of the first difference in `count` characters; `count` where there is none.
+unsigned firstDifference(const char16* a, const char16* b, unsigned count)
+{
+    constexpr unsigned kStep = 4;
+    if (count < kStep)
+        return static_cast<unsigned>(std::mismatch(a, a + count, b).first - a);
+    const unsigned lastStep = count - kStep;
+    for (unsigned i = 0;; i = std::min(i + kStep, lastStep))
+    {
+        if (const uint64 difference = fourCharacters(a + i) ^ fourCharacters(b + i))
+            return i + firstDifferentOfFour(difference);
+        if (i == lastStep)
+            return count;
+    }
+}
+
+int compareExactly(const char16* a, unsigned lengthA, const char16* b, unsigned lengthB)
+{
+    const unsigned same = firstDifference(a, b, std::min(lengthA, lengthB));
+    if (same < lengthA && same < lengthB)
         return a[same] - b[same];
     if (lengthA == lengthB)
         return 0;
     return lengthA < lengthB ? -1 : a[same];
+}
+
+/// `lengthA` and `lengthB` are cut to the limit of the comparison.
+int compareWide(const char16* a, unsigned lengthA, const char16* b, unsigned lengthB, CompareMode mode)
+{
+    return mode == kCaseSensitive ? compareExactly(a, lengthA, b, lengthB)
+                                  : ITextServices::instance().compareIgnoringCase(a, lengthA, b, lengthB);
 }
 
 bool isSameCharacter(char a, char b, CompareMode mode)
@@ -159,6 +194,9 @@ int countInOneWidth(const ConstString& text, const ConstString& character, unsig
 
 int ConstString::compare(const ConstString& text, int count, CompareMode mode) const
 {
+    // Most texts are wide and most comparisons whole.
+    if (isWide && text.isWide && count < 0 && mode == kCaseSensitive && text.len > 0)
+        return compareExactly(chars16(), len, text.chars16(), text.len);
     if (count == 0)
         return 0;
     if (text.isEmpty())
