@@ -2,9 +2,11 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <cstdint>
 #include <cstring>
 #include <mutex>
+#include <random>
 #include <set>
 #include <thread>
 #include <vector>
@@ -93,6 +95,58 @@ TEST(BlockPool, BlocksThatAnotherThreadReturnsGoRound)
     EXPECT_LT(seen.size(), 3u * kMany) << "what a thread had at hand must not be lost when it ends";
 }
 
+TEST(BlockPool, BlocksThatAreTakenTogetherLieTogetherWhateverWasReturned)
+{
+    if (!kIsPooled)
+        GTEST_SKIP() << "every block comes from malloc here";
+    constexpr std::size_t kFar = 64 * 1024;
+    Blocks all;
+    for (int i = 0; i < 100; i++)
+    {
+        const Blocks some = takeMany();
+        all.insert(all.end(), some.begin(), some.end());
+    }
+    std::shuffle(all.begin(), all.end(), std::mt19937(1));
+    giveBackAll(all);
+
+    const Blocks blocks = takeMany();
+    std::set<std::uintptr_t> places;
+    for (void* block : blocks)
+        places.insert(reinterpret_cast<std::uintptr_t>(block) / kFar);
+    EXPECT_LT(places.size(), 10u);
+    giveBackAll(blocks);
+}
+
+TEST(BlockPool, MemoryServesBlocksOfAnotherSizeAfterwards)
+{
+    if (!kIsPooled)
+        GTEST_SKIP() << "every block comes from malloc here";
+    constexpr std::size_t kOther = 2 * kSize;
+    constexpr std::size_t kPage = 4096;
+    std::set<std::uintptr_t> pages;
+    const Blocks blocks = [&pages]
+    {
+        Blocks taken;
+        for (int i = 0; i < 40 * kMany; i++)
+        {
+            taken.push_back(BlockPool::take(kSize));
+            pages.insert(reinterpret_cast<std::uintptr_t>(taken.back()) / kPage);
+        }
+        return taken;
+    }();
+    giveBackAll(blocks);
+    int known = 0;
+    Blocks others;
+    for (int i = 0; i < 10 * kMany; i++)
+    {
+        others.push_back(BlockPool::take(kOther));
+        known += pages.contains(reinterpret_cast<std::uintptr_t>(others.back()) / kPage);
+    }
+    EXPECT_GT(known, 5 * kMany);
+    for (void* block : others)
+        BlockPool::giveBack(block, kOther);
+}
+
 TEST(BlockPool, ThreadsTakeAndReturnAtTheSameTime)
 {
     std::mutex lock;
@@ -134,7 +188,7 @@ TEST(BlockPool, ABlockThatIsReturnedAfterItsThreadWasClearedIsKept)
     if (!kIsPooled)
         GTEST_SKIP() << "every block comes from malloc here";
     std::set<void*> seen;
-    for (int round = 0; round < 500; round++)
+    for (int round = 0; round < 5 * kMany; round++)
     {
         std::thread(
             [&seen]
@@ -146,5 +200,5 @@ TEST(BlockPool, ABlockThatIsReturnedAfterItsThreadWasClearedIsKept)
             })
             .join();
     }
-    EXPECT_LT(seen.size(), 200u);
+    EXPECT_LT(seen.size(), 3u * kMany);
 }

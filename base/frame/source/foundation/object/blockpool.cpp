@@ -1,7 +1,10 @@
 #include "foundation/object/blockpool.h"
 
 #include <algorithm>
+#include <atomic>
+#include <cstdint>
 #include <cstdlib>
+#include <iterator>
 #include <mutex>
 #include <utility>
 
@@ -31,125 +34,296 @@ namespace
 {
 /// Blocks whose size is a multiple of 16 are aligned to it; a type that needs that has such a size.
 constexpr std::size_t kStep = 8;
+constexpr std::size_t kSmallest = 16;
 constexpr std::size_t kSizes = BlockPool::kLargest / kStep;
-/// The blocks that are made, and that go to the store, at a time.
-constexpr unsigned kBatch = 64;
+/// Slabs are aligned to their size, so that the address of a block leads to its slab.
+constexpr std::size_t kSlabSize = 64 * 1024;
+constexpr std::size_t kSlabsAtATime = 16;
+constexpr std::size_t kLine = 64;
+/// The heads of neighbouring slabs lie at different lines, or they would all compete for the same few places in a cache.
+constexpr std::size_t kHeadPlaces = 32;
+/// Fresh blocks are handed out by and by, so that only memory that is used is touched.
+constexpr std::size_t kStretch = 4096;
 
-/// What stands in a block while it is free. `nextBatch` counts in the first block of a batch in the store.
+class ThreadPool;
+
+/// What stands in a block while it is free.
 struct FreeBlock
 {
     FreeBlock* next;
-    FreeBlock* nextBatch;
 };
 
-/// The free blocks of one size that no thread has at hand, in batches.
-class Store
+/// Memory for blocks of one size. This is its head, the blocks follow. It belongs to the pool of one thread, or to the
+/// store while none of its blocks is taken.
+struct alignas(kLine) Slab
 {
-public:
-    void put(FreeBlock* batch)
-    {
-        const std::lock_guard<std::mutex> guard(lock);
-        batch->nextBatch = first;
-        first = batch;
-    }
-    /// Null where there is none.
-    FreeBlock* take()
-    {
-        const std::lock_guard<std::mutex> guard(lock);
-        FreeBlock* batch = first;
-        if (batch)
-            first = batch->nextBatch;
-        return batch;
-    }
-
-private:
-    std::mutex lock;
-    FreeBlock* first = nullptr;
+    ThreadPool* owner;
+    FreeBlock* free;
+    /// Behind the blocks that were handed out at least once.
+    char* fresh;
+    Slab* next;
+    Slab* previous;
+    unsigned index;
+    unsigned taken;
+    /// Whether it is in none of its pool's lists.
+    bool isFull;
 };
-
-/// The free blocks of one size that a thread has at hand. The whole batch in reserve keeps a thread that takes and
-/// returns in turn away from the store. At most `kBatch` blocks stand in the list itself.
-struct Shelf
-{
-    FreeBlock* first = nullptr;
-    unsigned count = 0;
-    FreeBlock* reserve = nullptr;
-};
-
-// Both outlive everything: objects are made before `main` and go after it.
-constinit Store stores[kSizes];
-constinit thread_local Shelf shelves[kSizes];
-/// Objects may go even after their thread has cleared its shelves; their blocks go right to the store.
-constinit thread_local bool isCleared = false;
-
-/// Clears the shelves of a thread that ends.
-struct ThreadEnd
-{
-    void watch() {}
-    ~ThreadEnd();
-};
-thread_local ThreadEnd threadEnd;
-
-ThreadEnd::~ThreadEnd()
-{
-    isCleared = true;
-    for (std::size_t i = 0; i < kSizes; i++)
-    {
-        Shelf& shelf = shelves[i];
-        if (shelf.first)
-            stores[i].put(shelf.first);
-        if (shelf.reserve)
-            stores[i].put(shelf.reserve);
-        // Neither takes nor keeps a block any more.
-        shelf = {nullptr, kBatch, nullptr};
-    }
-}
 
 std::size_t indexOf(std::size_t size)
 {
-    return (std::max(size, sizeof(FreeBlock)) - 1) / kStep;
+    return (std::max(size, kSmallest) - 1) / kStep;
 }
 
-FreeBlock* makeBatch(std::size_t blockSize)
+std::size_t sizeAt(std::size_t index)
 {
-    // The list is linked as the blocks lie, so that objects made one after the other lie side by side.
-    auto* bytes = static_cast<char*>(std::malloc(kBatch * blockSize));
-    FreeBlock* first = nullptr;
-    for (unsigned i = bytes ? kBatch : 0; i > 0; i--)
-        first = new (bytes + (i - 1) * blockSize) FreeBlock{first, nullptr};
-    return first;
+    return (index + 1) * kStep;
 }
 
-/// For an empty shelf: gets a batch and takes its first block.
-void* takeFromBatch(std::size_t index)
+/// The head of the slab in which `memory` lies.
+Slab* slabOf(void* memory)
 {
-    threadEnd.watch();
-    Shelf& shelf = shelves[index];
-    FreeBlock* batch = std::exchange(shelf.reserve, nullptr);
-    if (!batch)
-        batch = stores[index].take();
-    if (!batch)
-        batch = makeBatch((index + 1) * kStep);
-    if (!batch)
+    const auto address = reinterpret_cast<std::uintptr_t>(memory);
+    const std::size_t head = address / kSlabSize % kHeadPlaces * kLine;
+    return reinterpret_cast<Slab*>(static_cast<char*>(memory) - address % kSlabSize + head);
+}
+
+char* endOf(Slab* slab)
+{
+    char* bytes = reinterpret_cast<char*>(slab);
+    return bytes + (kSlabSize - reinterpret_cast<std::uintptr_t>(bytes) % kSlabSize);
+}
+
+/// The blocks that one thread hands out. It is that thread's alone, but for the blocks that others return.
+class ThreadPool
+{
+public:
+    ThreadPool() { std::fill(std::begin(current), std::end(current), &noBlocks); }
+
+    void* take(std::size_t index)
+    {
+        Slab* slab = current[index];
+        return slab->free ? takeFrom(slab) : takeFromNext(index);
+    }
+    /// `slab` is the block's, and belongs to this pool.
+    void giveBack(FreeBlock* block, Slab* slab)
+    {
+        block->next = slab->free;
+        slab->free = block;
+        slab->taken--;
+        if (slab->isFull || slab->taken == 0)
+            arrange(slab);
+    }
+    /// From any thread.
+    void giveBackFromOutside(FreeBlock* block)
+    {
+        block->next = returned.load(std::memory_order_relaxed);
+        while (!returned.compare_exchange_weak(block->next, block, std::memory_order_release,
+                                               std::memory_order_relaxed))
+        {
+        }
+    }
+
+    /// For whoever keeps the pool while no thread has it.
+    ThreadPool* next = nullptr;
+
+private:
+    static void* takeFrom(Slab* slab)
+    {
+        FreeBlock* block = slab->free;
+        slab->free = block->next;
+        slab->taken++;
+        return block;
+    }
+    void* takeFromNext(std::size_t index);
+    void collectReturned();
+    Slab* nextSlab(std::size_t index);
+    void arrange(Slab* slab);
+    void enlist(Slab* slab);
+    void unlist(Slab* slab);
+
+    /// Stands for a slab where there is none yet; nobody writes to it.
+    static constinit Slab noBlocks;
+
+    /// By size: the slab that blocks are taken from, and the others that have free ones.
+    Slab* current[kSizes];
+    Slab* others[kSizes] = {};
+    alignas(kLine) std::atomic<FreeBlock*> returned = nullptr;
+};
+
+constinit Slab ThreadPool::noBlocks = {};
+
+/// What belongs to no thread: slabs without taken blocks, and the pools of threads that have ended, to which their
+/// blocks still come back. Thread-safe.
+class Store
+{
+public:
+    /// Null without memory, as `takePool`.
+    Slab* takeSlab()
+    {
+        Slab* slab = take(slabs);
+        return slab ? slab : makeSlabs();
+    }
+    void put(Slab* slab) { put(slabs, slab); }
+    ThreadPool* takePool()
+    {
+        ThreadPool* pool = take(pools);
+        return pool ? pool : new (std::nothrow) ThreadPool;
+    }
+    void put(ThreadPool* pool) { put(pools, pool); }
+
+private:
+    template <class Kept>
+    Kept* take(Kept*& first)
+    {
+        const std::lock_guard<std::mutex> guard(lock);
+        return first ? std::exchange(first, first->next) : nullptr;
+    }
+    template <class Kept>
+    void put(Kept*& first, Kept* kept)
+    {
+        const std::lock_guard<std::mutex> guard(lock);
+        kept->next = std::exchange(first, kept);
+    }
+    /// Keeps all but the first one.
+    Slab* makeSlabs();
+
+    std::mutex lock;
+    Slab* slabs = nullptr;
+    ThreadPool* pools = nullptr;
+};
+
+// Outlives everything: objects are made before `main` and go after it.
+constinit Store store;
+constinit thread_local ThreadPool* threadPool = nullptr;
+/// Objects may come and go even after their thread has given up its pool.
+constinit thread_local bool isOver = false;
+
+/// Gives up the pool of a thread that ends.
+struct ThreadEnd
+{
+    void watch() {}
+    ~ThreadEnd()
+    {
+        isOver = true;
+        store.put(std::exchange(threadPool, nullptr));
+    }
+};
+thread_local ThreadEnd threadEnd;
+
+Slab* Store::makeSlabs()
+{
+    auto* bytes = static_cast<char*>(std::malloc((kSlabsAtATime + 1) * kSlabSize));
+    if (!bytes)
         return nullptr;
-    if (!isCleared)
-        shelf = {batch->next, kBatch - 1, nullptr};
-    else if (batch->next)
-        stores[index].put(batch->next);
-    return batch;
+    bytes += kSlabSize - reinterpret_cast<std::uintptr_t>(bytes) % kSlabSize;
+    for (std::size_t i = kSlabsAtATime - 1; i > 0; i--)
+        put(new (slabOf(bytes + i * kSlabSize)) Slab{});
+    return new (slabOf(bytes)) Slab{};
 }
 
-/// For a full shelf.
-void giveToStore(FreeBlock* block, std::size_t index)
+/// Makes some of the fresh blocks free.
+void addFresh(Slab* slab)
 {
-    threadEnd.watch();
-    Shelf& shelf = shelves[index];
-    block->next = nullptr;
-    if (isCleared)
-        return stores[index].put(block);
-    if (shelf.reserve)
-        stores[index].put(shelf.reserve);
-    shelf = {block, 1, shelf.first};
+    const std::size_t size = sizeAt(slab->index);
+    const auto left = static_cast<std::size_t>(endOf(slab) - slab->fresh);
+    char* end = slab->fresh + std::min(left, kStretch) / size * size;
+    // Linked as the blocks lie, so that objects made one after the other lie side by side.
+    for (char* block = end; block != slab->fresh;)
+    {
+        block -= size;
+        slab->free = new (block) FreeBlock{slab->free};
+    }
+    slab->fresh = end;
+}
+
+void* ThreadPool::takeFromNext(std::size_t index)
+{
+    collectReturned();
+    Slab* slab = current[index];
+    if (!slab->free && slab->owner)
+        addFresh(slab);
+    if (!slab->free)
+        slab = nextSlab(index);
+    return slab ? takeFrom(slab) : nullptr;
+}
+
+void ThreadPool::collectReturned()
+{
+    if (!returned.load(std::memory_order_relaxed))
+        return;
+    FreeBlock* block = returned.exchange(nullptr, std::memory_order_acquire);
+    while (block)
+    {
+        FreeBlock* collected = std::exchange(block, block->next);
+        giveBack(collected, slabOf(collected));
+    }
+}
+
+/// Null without memory.
+Slab* ThreadPool::nextSlab(std::size_t index)
+{
+    Slab* slab = others[index];
+    if (slab)
+        unlist(slab);
+    else
+    {
+        slab = store.takeSlab();
+        if (!slab)
+            return nullptr;
+        *slab = {this,    nullptr, reinterpret_cast<char*>(slab + 1),
+                 nullptr, nullptr, static_cast<unsigned>(index),
+                 0,       false};
+        addFresh(slab);
+    }
+    if (current[index]->owner)
+        current[index]->isFull = true;
+    current[index] = slab;
+    return slab;
+}
+
+/// For a slab that has its first free block, or only such.
+void ThreadPool::arrange(Slab* slab)
+{
+    if (slab->isFull)
+        return enlist(slab);
+    if (slab == current[slab->index])
+        return;
+    unlist(slab);
+    store.put(slab);
+}
+
+void ThreadPool::enlist(Slab* slab)
+{
+    Slab*& first = others[slab->index];
+    slab->isFull = false;
+    slab->previous = nullptr;
+    slab->next = std::exchange(first, slab);
+    if (slab->next)
+        slab->next->previous = slab;
+}
+
+void ThreadPool::unlist(Slab* slab)
+{
+    (slab->previous ? slab->previous->next : others[slab->index]) = slab->next;
+    if (slab->next)
+        slab->next->previous = slab->previous;
+}
+
+/// For a thread without a pool.
+void* takeFirst(std::size_t index)
+{
+    ThreadPool* pool = store.takePool();
+    if (!pool)
+        return nullptr;
+    void* block = pool->take(index);
+    if (isOver)
+        store.put(pool);
+    else
+    {
+        threadEnd.watch();
+        threadPool = pool;
+    }
+    return block;
 }
 } // namespace
 
@@ -158,13 +332,7 @@ void* BlockPool::take(std::size_t size) noexcept
     if (size > kLargest)
         return std::malloc(size);
     const std::size_t index = indexOf(size);
-    Shelf& shelf = shelves[index];
-    FreeBlock* block = shelf.first;
-    if (!block)
-        return takeFromBatch(index);
-    shelf.first = block->next;
-    shelf.count--;
-    return block;
+    return threadPool ? threadPool->take(index) : takeFirst(index);
 }
 
 void BlockPool::giveBack(void* memory, std::size_t size) noexcept
@@ -173,14 +341,12 @@ void BlockPool::giveBack(void* memory, std::size_t size) noexcept
         return std::free(memory);
     if (!memory)
         return;
-    const std::size_t index = indexOf(size);
     auto* block = static_cast<FreeBlock*>(memory);
-    Shelf& shelf = shelves[index];
-    if (shelf.count == kBatch)
-        return giveToStore(block, index);
-    block->next = shelf.first;
-    shelf.first = block;
-    shelf.count++;
+    Slab* slab = slabOf(memory);
+    if (slab->owner == threadPool)
+        threadPool->giveBack(block, slab);
+    else
+        slab->owner->giveBackFromOutside(block);
 }
 
 #endif

@@ -5,11 +5,12 @@
 
 /// Memory for what is small and comes by the thousands: objects, tree nodes, links, messages.
 ///
-/// Each thread has lists of free blocks at hand, one for each size, so that taking and returning a block costs a few
-/// instructions, and a block has no header. A list that has grown long is handed to a store which all threads share:
-/// blocks that one thread takes and another one returns go round. Memory stays with the pool for the next blocks and
-/// is never given back to the system. Blocks of more than `kLargest` bytes, and with the address or the thread
-/// sanitizer all blocks, come from `malloc`, so that these tools see what they are made for. Thread-safe.
+/// Each thread has slabs of memory, each for blocks of one size, so that taking and returning a block costs a few
+/// instructions, and a block has no header. Blocks come from one slab until it has none left: what is made together
+/// lies together, even where many blocks came back in any order before. A block that another thread returns goes back
+/// to its slab. Slabs without taken blocks serve any size and thread; memory is never given back to the system.
+/// Blocks of more than `kLargest` bytes, and with the address or the thread sanitizer all blocks, come from `malloc`,
+/// so that these tools see what they are made for. Thread-safe.
 namespace BlockPool
 {
 inline constexpr std::size_t kLargest = 256;
