@@ -8,6 +8,8 @@
 
 #include <gtest/gtest.h>
 
+#include <memory>
+
 TEST(CmAssociation, IsComparedByItsKey)
 {
     Item one(1), sameOne(1), two(2), object(3), otherObject(4);
@@ -181,6 +183,34 @@ TYPED_TEST(DictionaryTest, CopiesHaveTheirOwnAssociations)
         EXPECT_NE(copied.lookupAssoc(&key), owning.lookupAssoc(&key));
     }
     EXPECT_EQ(rankOf(owning.lookup(&key)), 20);
+}
+
+TYPED_TEST(DictionaryTest, APairStandsInSeveralDictionaries)
+{
+    Item key(1), object(10), otherKey(2);
+    auto first = std::make_unique<TypeParam>();
+    ASSERT_TRUE(first->add(&key, &object));
+    CmAssociation* pair = first->lookupAssoc(&key);
+    pair->addRef();
+
+    TypeParam second;
+    pair->addRef();
+    ASSERT_TRUE(second.add(pair));
+    ASSERT_TRUE(second.add(&otherKey, &object));
+    ASSERT_TRUE(first->remove(&key));
+    EXPECT_EQ(second.lookupAssoc(&key), pair);
+
+    // It is put back, and taken out with the table.
+    pair->addRef();
+    ASSERT_TRUE(first->add(pair));
+    EXPECT_EQ(first->lookupObject(&key), &object);
+    first.reset();
+    EXPECT_EQ(second.lookupAssoc(&key), pair);
+    ASSERT_TRUE(second.remove(&key));
+    EXPECT_EQ(pair->getRefCount(), 1u);
+    EXPECT_EQ(pair->getKey(), &key);
+    EXPECT_TRUE(pair->isA("CmAssociation"));
+    pair->release();
 }
 
 TEST(CmBTreeDictionary, IsReadInOrderOfKeys)

@@ -1,12 +1,13 @@
 #pragma once
 
 #include "foundation/object/cmobject.h"
-#include "foundation/object/iptr.h"
+
+struct CmHashNode;
 
 /// A key with its object, as the dictionaries hold it. Equality, order and hash look at the key alone.
 ///
 /// It owns neither: the container that holds it does the releasing. Only what it was restored with from a file lives
-/// as long as the association. A copy shares both. One thread at a time.
+/// as long as it stands here. A copy shares both. One thread at a time.
 class CmAssociation : public CmObject
 {
     DECLARE_CLASS(CmAssociation, CmObject)
@@ -15,11 +16,14 @@ class CmAssociation : public CmObject
     explicit CmAssociation(CmObject* itsKey, CmObject* itsObject = nullptr) : key(itsKey), object(itsObject)
     {
     }
+    CmAssociation(const CmAssociation& other);
+    CmAssociation& operator=(const CmAssociation& other);
+    ~CmAssociation() override { clear(); }
 
     CmObject* getKey() const { return key; }
     CmObject* getObject() const { return object; }
-    void setKey(CmObject* newKey) { key = newKey; }
-    void setObject(CmObject* newObject) { object = newObject; }
+    void setKey(CmObject* newKey);
+    void setObject(CmObject* newObject);
     /// Gives the references on what was restored to the caller, who is going to release key and object.
     void handOver();
 
@@ -33,12 +37,19 @@ class CmAssociation : public CmObject
     bool storeAttributes(FAttributes& attributes) const override;
     bool restoreAttributes(FAttributes& attributes) override;
 
+    /// A place for the chain of a hash table, which lies beside key and object; null where there is none. It is free
+    /// while it names no object.
+    virtual CmHashNode* ownNode() { return nullptr; }
+
 private:
     /// Takes over the references on a whole pair; half a pair is given back, and the result is false.
     bool restorePair(CmObject* restoredKey, CmObject* restoredObject);
+    void clear();
+
+    // Both lie in the room that the count leaves: a pair then needs half a line of a cache.
+    bool isKeyHeld = false;
+    bool isObjectHeld = false;
 
     CmObject* key = nullptr;
     CmObject* object = nullptr;
-    IPtr<CmObject> heldKey;
-    IPtr<CmObject> heldObject;
 };

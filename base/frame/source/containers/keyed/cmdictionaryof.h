@@ -4,12 +4,12 @@
 #include "containers/sequence/cmiterator.h"
 
 /// The operations that the three dictionaries share, on the container that holds their associations. It stands
-/// between that container and them, and is no class of the object model.
+/// between that container and them, and is no class of the object model. `Association` is what `add` makes of a pair.
 ///
 /// Keys are unique. In modes 1 and 2 key and object are released when they leave; the association is the
 /// dictionary's own in every mode. Beware: in mode 2 `add` gives key and object no reference, so use modes 0 and 1.
 /// One thread at a time.
-template <class Container>
+template <class Container, class Association = CmAssociation>
 class CmDictionaryOf : public Container
 {
 public:

@@ -2,16 +2,17 @@
 
 #include "containers/keyed/cmdictionaryof.h"
 #include "containers/sequence/cmcontainer.h"
+#include "foundation/object/iptr.h"
 
 #include <memory>
 #include <vector>
 
 // The bodies of CmDictionaryOf, for the sources that instantiate it.
 
-template <class Container>
-bool CmDictionaryOf<Container>::add(CmObject* key, CmObject* object)
+template <class Container, class Association>
+bool CmDictionaryOf<Container, Association>::add(CmObject* key, CmObject* object)
 {
-    auto* association = new CmAssociation(key, object);
+    auto* association = new Association(key, object);
     const bool isAdded = add(association);
     // In mode 2 the container holds a reference of its own.
     if (!isAdded || this->_ownsObjects == CmContainer::kRetained)
@@ -19,8 +20,8 @@ bool CmDictionaryOf<Container>::add(CmObject* key, CmObject* object)
     return isAdded;
 }
 
-template <class Container>
-bool CmDictionaryOf<Container>::add(CmObject* object)
+template <class Container, class Association>
+bool CmDictionaryOf<Container, Association>::add(CmObject* object)
 {
     CmAssociation* association = FCast(CmAssociation, object);
     if (!association || !association->getKey() || !Container::addUnique(object))
@@ -30,8 +31,8 @@ bool CmDictionaryOf<Container>::add(CmObject* object)
     return true;
 }
 
-template <class Container>
-bool CmDictionaryOf<Container>::remove(CmObject* key)
+template <class Container, class Association>
+bool CmDictionaryOf<Container, Association>::remove(CmObject* key)
 {
     const CmAssociation probe(key);
     CmObject* association = key ? Container::takeEqual(&probe) : nullptr;
@@ -43,8 +44,8 @@ bool CmDictionaryOf<Container>::remove(CmObject* key)
     return true;
 }
 
-template <class Container>
-bool CmDictionaryOf<Container>::remove(const CmIterator& position)
+template <class Container, class Association>
+bool CmDictionaryOf<Container, Association>::remove(const CmIterator& position)
 {
     if (!position.walksOver(this) || position.done())
         return false;
@@ -54,8 +55,8 @@ bool CmDictionaryOf<Container>::remove(const CmIterator& position)
     return true;
 }
 
-template <class Container>
-bool CmDictionaryOf<Container>::removeAt(int index)
+template <class Container, class Association>
+bool CmDictionaryOf<Container, Association>::removeAt(int index)
 {
     CmObject* association = this->at(index);
     if (!association)
@@ -66,8 +67,8 @@ bool CmDictionaryOf<Container>::removeAt(int index)
     return true;
 }
 
-template <class Container>
-void CmDictionaryOf<Container>::removeAll()
+template <class Container, class Association>
+void CmDictionaryOf<Container, Association>::removeAll()
 {
     std::vector<Pair> pairs;
     for (std::unique_ptr<CmIterator> it(this->newIterator()); !it->done();)
@@ -78,8 +79,8 @@ void CmDictionaryOf<Container>::removeAll()
         giveUp(pair);
 }
 
-template <class Container>
-bool CmDictionaryOf<Container>::replace(const CmObject* key, CmObject* newObject)
+template <class Container, class Association>
+bool CmDictionaryOf<Container, Association>::replace(const CmObject* key, CmObject* newObject)
 {
     CmAssociation* association = lookupAssoc(key);
     if (!association)
@@ -93,15 +94,15 @@ bool CmDictionaryOf<Container>::replace(const CmObject* key, CmObject* newObject
     return true;
 }
 
-template <class Container>
-CmObject* CmDictionaryOf<Container>::lookupObject(const CmObject* key) const
+template <class Container, class Association>
+CmObject* CmDictionaryOf<Container, Association>::lookupObject(const CmObject* key) const
 {
     const CmAssociation* association = lookupAssoc(key);
     return association ? association->getObject() : nullptr;
 }
 
-template <class Container>
-CmAssociation* CmDictionaryOf<Container>::lookupAssoc(const CmObject* key) const
+template <class Container, class Association>
+CmAssociation* CmDictionaryOf<Container, Association>::lookupAssoc(const CmObject* key) const
 {
     if (!key)
         return nullptr;
@@ -109,14 +110,14 @@ CmAssociation* CmDictionaryOf<Container>::lookupAssoc(const CmObject* key) const
     return static_cast<CmAssociation*>(Container::lookup(&probe));
 }
 
-template <class Container>
-int CmDictionaryOf<Container>::occurrences(const CmObject* key) const
+template <class Container, class Association>
+int CmDictionaryOf<Container, Association>::occurrences(const CmObject* key) const
 {
     return lookupAssoc(key) ? 1 : 0;
 }
 
-template <class Container>
-bool CmDictionaryOf<Container>::addFromOther(CmObject* element)
+template <class Container, class Association>
+bool CmDictionaryOf<Container, Association>::addFromOther(CmObject* element)
 {
     // An association belongs to one dictionary, so each gets its own.
     const CmAssociation* association = FCast(CmAssociation, element);
@@ -141,8 +142,8 @@ bool CmDictionaryOf<Container>::addFromOther(CmObject* element)
     return isAdded;
 }
 
-template <class Container>
-bool CmDictionaryOf<Container>::addRestored(CmObject* element)
+template <class Container, class Association>
+bool CmDictionaryOf<Container, Association>::addRestored(CmObject* element)
 {
     // An attribute tree may give the same association to several dictionaries, so each makes its own.
     const IPtr<CmObject> restored = adopt(element);
@@ -156,8 +157,8 @@ bool CmDictionaryOf<Container>::addRestored(CmObject* element)
 }
 
 // What an association that has left held; in mode 0 the association itself is still to be released.
-template <class Container>
-void CmDictionaryOf<Container>::giveUp(const Pair& pair)
+template <class Container, class Association>
+void CmDictionaryOf<Container, Association>::giveUp(const Pair& pair)
 {
     this->testDelete(pair.key);
     this->testDelete(pair.object);

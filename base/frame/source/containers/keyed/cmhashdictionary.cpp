@@ -2,6 +2,23 @@
 
 #include "containers/keyed/cmdictionaryofbodies.h"
 
-template class CmDictionaryOf<CmHashTable>;
+template class CmDictionaryOf<CmHashTable, CmHashAssociation>;
 
 DEFINE_CLASS(CmHashDictionary, CmHashTable)
+
+CmHashNode* CmHashDictionary::makeNode(CmObject* object)
+{
+    // An association may stand in several dictionaries, but its own node only in one.
+    CmHashNode* node = static_cast<CmAssociation*>(object)->ownNode();
+    if (!node || node->object)
+        return CmHashTable::makeNode(object);
+    node->object = object;
+    return node;
+}
+
+void CmHashDictionary::dropNode(CmHashNode* node)
+{
+    if (static_cast<CmAssociation*>(node->object)->ownNode() != node)
+        return CmHashTable::dropNode(node);
+    node->object = nullptr;
+}

@@ -3,12 +3,25 @@
 #include "containers/keyed/cmdictionaryof.h"
 #include "containers/keyed/cmhashtable.h"
 
-extern template class CmDictionaryOf<CmHashTable>;
+/// A pair with its place in a chain, so that a search finds both at one go. It passes for a CmAssociation, and is no
+/// class of the object model. One thread at a time.
+class CmHashAssociation final : public CmAssociation
+{
+public:
+    using CmAssociation::CmAssociation;
+
+    CmHashNode* ownNode() override { return &node; }
+
+private:
+    CmHashNode node = {};
+};
+
+extern template class CmDictionaryOf<CmHashTable, CmHashAssociation>;
 
 /// The dictionary for text keys, found by hash. One thread at a time.
 ///
 /// A hash function that is set gets associations.
-class CmHashDictionary : public CmDictionaryOf<CmHashTable>
+class CmHashDictionary : public CmDictionaryOf<CmHashTable, CmHashAssociation>
 {
     DECLARE_CLASS(CmHashDictionary, CmHashTable)
 
@@ -17,5 +30,11 @@ class CmHashDictionary : public CmDictionaryOf<CmHashTable>
     {
         CmContainer::copy(other);
     }
+    // While the nodes are still known as its own.
+    ~CmHashDictionary() override { CmDictionaryOf::removeAll(); }
     CmHashDictionary& operator=(const CmHashDictionary& other) { return assign(*this, other); }
+
+protected:
+    CmHashNode* makeNode(CmObject* object) override;
+    void dropNode(CmHashNode* node) override;
 };

@@ -101,7 +101,7 @@ bool CmHashTable::growIfCrowded()
 
 bool CmHashTable::addTo(CmHashBucket& bucket, CmObject* object)
 {
-    append(bucket, new CmHashNode{nullptr, object});
+    append(bucket, makeNode(object));
     _total++;
     testRemember(object);
     return true;
@@ -213,7 +213,7 @@ CmObject* CmHashTable::unlink(CmHashBucket& bucket, CmHashNode* predecessor, CmH
     bucket.count--;
     _total--;
     CmObject* object = node->object;
-    delete node;
+    dropNode(node);
     return object;
 }
 

@@ -70,6 +70,10 @@ protected:
     bool addUnique(CmObject* object);
     /// Takes out the first equal element and gives it, with its reference; null where there is none.
     CmObject* takeEqual(const CmObject* object);
+    /// A node for `object`, which is going to stand in the table. Throws where there is no memory.
+    virtual CmHashNode* makeNode(CmObject* object) { return new CmHashNode{nullptr, object}; }
+    /// For a node whose object is alive, but no longer in the table.
+    virtual void dropNode(CmHashNode* node) { delete node; }
 
 private:
     friend class CmHashTableIterator;
