@@ -49,21 +49,28 @@ bool CmBTree::add(CmObject* object)
 {
     if (!object)
         return false;
-    CmBTreeNode* leaf = leafFor(object);
+    int place = 0;
+    CmBTreeNode* leaf = leafFor(object, place);
     CmBTreeNode* spares = nullptr;
     if (!makeSpareNodes(leaf, spares))
         return false;
-    insertUpwards(leaf, object, spares);
+    insertUpwards(leaf, place, object, spares);
     testRemember(object);
     _size++;
     return true;
 }
 
-CmBTreeNode* CmBTree::leafFor(const CmObject* object) const
+// The leaf and the place in it where `object` goes; null in an empty tree.
+CmBTreeNode* CmBTree::leafFor(const CmObject* object, int& place) const
 {
     CmBTreeNode* node = _root;
-    while (node && !node->isLeaf())
-        node = node->children[node->shouldGo(object)];
+    while (node)
+    {
+        place = node->shouldGo(object);
+        if (node->isLeaf())
+            break;
+        node = node->children[place];
+    }
     return node;
 }
 
@@ -91,7 +98,7 @@ bool CmBTree::makeSpareNodes(const CmBTreeNode* leaf, CmBTreeNode*& spares) cons
     return true;
 }
 
-void CmBTree::insertUpwards(CmBTreeNode* leaf, CmObject* object, CmBTreeNode* spares)
+void CmBTree::insertUpwards(CmBTreeNode* leaf, int place, CmObject* object, CmBTreeNode* spares)
 {
     CmObject* key = object;
     CmBTreeNode* left = nullptr;
@@ -100,7 +107,7 @@ void CmBTree::insertUpwards(CmBTreeNode* leaf, CmObject* object, CmBTreeNode* sp
     {
         // A separator belongs where the node stood that it was split from. Its rank alone would also allow a place
         // behind equal keys further on, which would change their order.
-        node->insert(left ? left->indexInParent() : node->shouldGo(key), key, right);
+        node->insert(left ? left->indexInParent() : place, key, right);
         if (node->count < _order)
             return;
         left = node;

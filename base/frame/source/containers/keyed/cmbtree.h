@@ -6,7 +6,8 @@
 
 /// A balanced tree of objects in the order of `compare`, which alone decides what is equal here.
 ///
-/// Equal elements are allowed and stand in the order of insertion. A node holds up to order - 1 of them.
+/// Equal elements are allowed and stand in the order of insertion. A node holds up to order - 1 of them and is searched
+/// key by key, so that a small order serves best.
 /// One thread at a time.
 class CmBTree : public CmContainer
 {
@@ -52,9 +53,9 @@ private:
 
     int minimum() const;
     bool isFull(const CmBTreeNode* node) const { return node->count == _order - 1; }
-    CmBTreeNode* leafFor(const CmObject* object) const;
+    CmBTreeNode* leafFor(const CmObject* object, int& place) const;
     bool makeSpareNodes(const CmBTreeNode* leaf, CmBTreeNode*& spares) const;
-    void insertUpwards(CmBTreeNode* leaf, CmObject* object, CmBTreeNode* spares);
+    void insertUpwards(CmBTreeNode* leaf, int place, CmObject* object, CmBTreeNode* spares);
     CmObject* split(CmBTreeNode* node, CmBTreeNode* right) const;
     CmObject* detach(CmBTreeNode* node, int index);
     void repair(CmBTreeNode* node);
