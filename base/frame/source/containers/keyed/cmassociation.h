@@ -18,7 +18,11 @@ class CmAssociation : public CmObject
     }
     CmAssociation(const CmAssociation& other);
     CmAssociation& operator=(const CmAssociation& other);
-    ~CmAssociation() override { clear(); }
+    ~CmAssociation() override
+    {
+        if (isKeyHeld || isObjectHeld)
+            clear();
+    }
 
     CmObject* getKey() const { return key; }
     CmObject* getObject() const { return object; }
