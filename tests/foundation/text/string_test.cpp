@@ -240,6 +240,26 @@ TEST(String, ConvertsLongTextsToUtf8)
     EXPECT_EQ(plain.text8(), std::string(1000, 'x'));
 }
 
+TEST(String, ConvertsPairsAndHalvesOfThemAtEveryPlace)
+{
+    const std::pair<std::u16string, std::string> pieces[] = {{u"\u00e9", "\u00e9"},
+                                                             {u"\U0001D11E", "\U0001D11E"},
+                                                             {u"\xD800", "?"},
+                                                             {u"\xDC00\u20ac", "?\u20ac"},
+                                                             {u"\xDBFF\xD834\xDD1E", "?\U0001D11E"}};
+    for (const auto& [wide, bytes] : pieces)
+        for (unsigned before = 0; before <= 40; before++)
+            for (unsigned behind = 0; behind <= 40; behind++)
+            {
+                const std::u16string source =
+                    std::u16string(before, u'a') + wide + std::u16string(behind, u'b');
+                String text(source.c_str());
+                EXPECT_TRUE(text.toMultiByte(kEncodingUtf8));
+                ASSERT_EQ(text.text8(), std::string(before, 'a') + bytes + std::string(behind, 'b'))
+                    << before << ", " << behind;
+            }
+}
+
 TEST(String, ChangesCaseAndForm)
 {
     String narrow("aB\x8A");

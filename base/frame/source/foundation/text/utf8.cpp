@@ -97,6 +97,30 @@ unsigned countAscii(const Element* text)
     return kBlock;
 }
 
+template <unsigned size, class Element>
+bool isAsciiBlock(const Element* text)
+{
+    uint64 all = 0;
+    for (unsigned i = 0; i < size; i += sizeof(uint64) / sizeof(Element))
+    {
+        uint64 word = 0;
+        memcpy(&word, text + i, sizeof(word));
+        all |= word;
+    }
+    return (all & kAboveAscii<Element>) == 0;
+}
+
+/// Copies `kBlock` characters to elements of another size. What is written to a place of its own can't be what is read
+/// next, and so goes through wide registers.
+template <class From, class To>
+void copyBlock(const From* in, To* out)
+{
+    To to[kBlock];
+    for (unsigned i = 0; i < kBlock; ++i)
+        to[i] = static_cast<To>(in[i]);
+    memcpy(out, to, sizeof(to));
+}
+
 /// Copies the characters below 128 at both places and steps behind them. A block is written whole, and then what
 /// follows writes over what was none of them: there is room, since no character gives less than one element.
 template <class From, class To>
@@ -104,34 +128,17 @@ void copyAscii(const From*& in, const From* end, To*& out)
 {
     while (end - in >= kBlock)
     {
-        // In places of their own the elements go through wide registers.
-        From from[kBlock];
-        To to[kBlock];
-        memcpy(from, in, sizeof(from));
-        for (unsigned i = 0; i < kBlock; ++i)
-            to[i] = static_cast<To>(from[i]);
-        memcpy(out, to, sizeof(to));
-        const unsigned count = countAscii(in);
+        copyBlock(in, out);
+        // Most blocks are plain; where in one the other character stands is asked only then.
+        const bool isPlain = isAsciiBlock<kBlock>(in);
+        const unsigned count = isPlain ? kBlock : countAscii(in);
         in += count;
         out += count;
-        if (count < kBlock)
+        if (!isPlain)
             return;
     }
     while (in < end && *in < 0x80)
         *out++ = static_cast<To>(*in++);
-}
-
-template <unsigned size>
-bool isAsciiBlock(const char16* text)
-{
-    uint64 all = 0;
-    for (unsigned i = 0; i < size; i += sizeof(uint64) / sizeof(char16))
-    {
-        uint64 word = 0;
-        memcpy(&word, text + i, sizeof(word));
-        all |= word;
-    }
-    return (all & kAboveAscii<char16>) == 0;
 }
 
 /// Cuts blocks of `size` characters to bytes, up to the first one that has a character above 127.
@@ -139,15 +146,8 @@ template <unsigned size>
 void narrowAsciiBlocks(const char16*& in, const char16* end, char*& out)
 {
     for (; end - in >= size && isAsciiBlock<size>(in); in += size)
-        for (unsigned i = 0; i < size; i += kBlock)
-        {
-            // What is written to a place of its own can't be what is read next, and so goes through wide registers.
-            char to[kBlock];
-            for (unsigned k = 0; k < kBlock; ++k)
-                to[k] = static_cast<char>(in[i + k]);
-            memcpy(out, to, sizeof(to));
-            out += kBlock;
-        }
+        for (unsigned i = 0; i < size; i += kBlock, out += kBlock)
+            copyBlock(in + i, out);
 }
 
 /// Writes the character above 127 at `in` and steps behind it.
