@@ -5,14 +5,6 @@
 
 DEFINE_CLASS(CmArray, CmContainer)
 
-bool CmArray::add(CmObject* object)
-{
-    if (!object || !makeRoom())
-        return false;
-    append(object);
-    return true;
-}
-
 bool CmArray::insertAt(int index, CmObject* object)
 {
     if (!object || index < 0 || index > _total || !makeRoom())

@@ -16,7 +16,13 @@ class CmArray : public CmArrayBase
     CmArray& operator=(const CmArray& other) { return assign(*this, other); }
     CmArray& operator=(const CmContainer& other) { return assign(*this, other); }
 
-    bool add(CmObject* object) override;
+    bool add(CmObject* object) override
+    {
+        if (!object || !makeRoom())
+            return false;
+        append(object);
+        return true;
+    }
     using CmArrayBase::remove;
     bool remove(CmObject* object) override { return removeAt(indexAbs(object)); }
 

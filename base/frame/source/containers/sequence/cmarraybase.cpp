@@ -19,9 +19,10 @@ bool cmpObjs(const CmObject* left, const CmObject* right)
 /// isn't moved at each of them.
 int roomFor(int places)
 {
+    // A multiple of a quarter of the power of two below.
     const unsigned wanted = static_cast<unsigned>(places);
     const unsigned step = std::max(std::bit_floor(wanted) / 4, 1u);
-    const unsigned rounded = (wanted + step - 1) / step * step;
+    const unsigned rounded = (wanted + step - 1) & ~(step - 1);
     return static_cast<int>(std::min(rounded, static_cast<unsigned>(INT_MAX)));
 }
 
@@ -139,15 +140,15 @@ bool CmArrayBase::reallocate(int newSize)
         _size = 0;
         return true;
     }
-    if (const int room = roomFor(newSize); !_objects || room != roomFor(_size))
+    const bool hasRoom = _objects && newSize >= _size && newSize <= roomFor(_size);
+    if (!hasRoom)
     {
-        void* places = realloc(static_cast<void*>(_objects), static_cast<size_t>(room) * sizeof *_objects);
+        const size_t room = static_cast<size_t>(roomFor(newSize));
+        void* places = realloc(static_cast<void*>(_objects), room * sizeof *_objects);
         if (!places)
             return false;
         _objects = static_cast<CmObject**>(places);
     }
-    for (; _size < newSize; _size++)
-        _objects[_size] = nullptr;
     _size = newSize;
     return true;
 }
