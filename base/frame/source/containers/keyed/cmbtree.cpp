@@ -369,14 +369,6 @@ CmBTreeIterator::CmBTreeIterator(const CmBTree& walked)
 {
 }
 
-CmObject* CmBTreeIterator::next()
-{
-    CmObject* left = current();
-    if (node)
-        advance();
-    return left;
-}
-
 CmObject* CmBTreeIterator::previous()
 {
     CmObject* left = current();
@@ -404,9 +396,9 @@ void CmBTreeIterator::seek(const CmObject* object) const
     node = tree.nodeSearch(tree._root, object, index);
 }
 
-void CmBTreeIterator::advance() const
+// Beyond a leaf's last key, or from an inner node's key into the child behind it.
+void CmBTreeIterator::leaveNode() const
 {
-    index++;
     if (!node->isLeaf())
     {
         node = outermostLeaf(node->children[index], false);

@@ -69,7 +69,7 @@ private:
 };
 
 /// Walks over a CmBTree in order. One thread at a time.
-class CmBTreeIterator : public CmIterator
+class CmBTreeIterator final : public CmIterator
 {
 public:
     explicit CmBTreeIterator(const CmBTree& walked);
@@ -77,7 +77,13 @@ public:
     using CmIterator::next;
     using CmIterator::previous;
     bool done() const override { return !node; }
-    CmObject* next() override;
+    CmObject* next() override
+    {
+        CmObject* left = current();
+        if (node)
+            advance();
+        return left;
+    }
     CmObject* previous() override;
     CmObject* current() const override { return node ? node->keys[index] : nullptr; }
     CmObject* first() override;
@@ -87,7 +93,13 @@ private:
     friend class CmBTree;
 
     void seek(const CmObject* object) const;
-    void advance() const;
+    void advance() const
+    {
+        index++;
+        if (index >= node->count || !node->isLeaf())
+            leaveNode();
+    }
+    void leaveNode() const;
     void retreat();
 
     const CmBTree& tree;
