@@ -3,17 +3,20 @@
 #include <bit>
 #include <cstring>
 #include <string>
-#include <type_traits>
 
 namespace
 {
 // The rule: every character is followed by the remainder, in 32 bits. Up to `kLargestShared` buckets nothing passes 32
-// bits there, so that a remainder may as well be taken seldom, as long as nothing passes 64 bits. Groups of four
-// characters are summed up independently of each other; to put one behind a hash, the hash is multiplied by 64 to the
-// power of four, or by the remainder of that, which leaves more room.
+// bits there, so that a remainder may as well be taken seldom, as long as nothing passes 64 bits. Groups of as many
+// characters as fit 64 bits are summed up independently of each other; to put one behind a hash, the hash is multiplied
+// by 64 to the power of their number, or by the remainder of that, which leaves more room.
 constexpr unsigned kLargestShared = 1u << 25;
-constexpr unsigned kGroup = 4;
-constexpr uint32 kBehindGroup = uint32{1} << 6 * kGroup;
+
+template <class Character>
+constexpr unsigned kGroup = sizeof(uint64) / sizeof(Character);
+
+template <class Character>
+constexpr uint64 kBehindGroup = uint64{1} << 6 * kGroup<Character>;
 
 uint32 widened(char character)
 {
@@ -34,48 +37,53 @@ unsigned hashByRule(const Character* text, size_t length, unsigned size)
     return hash;
 }
 
-/// Four characters in one word.
 template <class Character>
-using Group = std::conditional_t<sizeof(Character) == 1, uint32, uint64>;
-
-template <class Character>
-Group<Character> groupAt(const Character* text)
+uint64 groupAt(const Character* text)
 {
-    Group<Character> group;
+    uint64 group;
     memcpy(&group, text, sizeof(group));
     return group;
 }
 
 /// The first `count` characters as the last ones of a group; the zeros before them add nothing to a hash.
 template <class Character>
-Group<Character> startOf(const Character* text, size_t count, size_t length)
+uint64 startOf(const Character* text, size_t count, size_t length)
 {
     constexpr unsigned kBits = 8 * sizeof(Character);
-    if (length >= kGroup)
-        return static_cast<Group<Character>>(groupAt(text) << kBits * (kGroup - count));
-    Character padded[kGroup] = {};
+    if (length >= kGroup<Character>)
+        return groupAt(text) << kBits * (kGroup<Character> - count);
+    Character padded[kGroup<Character>] = {};
     for (size_t i = 0; i < count; i++)
-        padded[kGroup - count + i] = text[i];
+        padded[kGroup<Character> - count + i] = text[i];
     return groupAt(padded);
 }
 
-/// The sum of a group whose first character is in the low bits: those of each pair are joined, and then the pairs.
-template <class Character>
-uint64 sumOf(Group<Character> group)
+/// Puts the second of two neighbours behind the first, which is in the lower bits: each takes `bits` of them, and the
+/// first counts 2 to the power of `shift` times.
+template <unsigned bits, unsigned shift>
+uint64 joined(uint64 group)
 {
-    constexpr unsigned kBits = 8 * sizeof(Character);
-    constexpr uint64 kFirst = (uint64{1} << kBits) - 1;
-    constexpr uint64 kFirstPair = (uint64{1} << 2 * kBits) - 1;
-    constexpr uint64 kFirsts = kFirst << 2 * kBits | kFirst;
-    const uint64 pairs = ((group & kFirsts) << 6) + (group >> kBits & kFirsts);
-    return ((pairs & kFirstPair) << 12) + (pairs >> 2 * kBits);
+    static_assert(bits == 8 || bits == 16 || bits == 32);
+    constexpr uint64 kFirsts = bits == 8    ? 0x00FF00FF00FF00FF
+                               : bits == 16 ? 0x0000FFFF0000FFFF
+                                            : 0x00000000FFFFFFFF;
+    return ((group & kFirsts) << shift) + (group >> bits & kFirsts);
+}
+
+/// The sum of a group whose first character is in the low bits.
+template <class Character>
+uint64 sumOf(uint64 group)
+{
+    if constexpr (sizeof(Character) == 1)
+        return joined<32, 24>(joined<16, 12>(joined<8, 6>(group)));
+    return joined<32, 12>(joined<16, 6>(group));
 }
 
 /// Whether a character counts as negative, so that the text has to go by the rule.
 template <class Character>
-bool hasNegative(Group<Character> group)
+bool hasNegative(uint64 group)
 {
-    return sizeof(Character) == 1 && (group & 0x80808080) != 0;
+    return sizeof(Character) == 1 && (group & 0x8080808080808080) != 0;
 }
 
 template <class Character>
@@ -85,13 +93,13 @@ unsigned hashText(const Character* text, size_t length, unsigned size)
         return 0;
     if (size > kLargestShared || std::endian::native != std::endian::little)
         return hashByRule(text, length, size);
-    const uint64 factor = kBehindGroup % size;
-    const uint64 largestHash = ~uint64{0} >> (1 + std::bit_width(size));
-    const size_t first = (length - 1) % kGroup + 1;
-    Group<Character> group = startOf(text, first, length);
-    Group<Character> all = group;
+    const size_t first = (length - 1) % kGroup<Character> + 1;
+    uint64 group = startOf(text, first, length);
+    uint64 all = group;
     uint64 hash = sumOf<Character>(group);
-    for (size_t i = first; i < length; i += kGroup)
+    const uint64 factor = first < length ? kBehindGroup<Character> % size : 0;
+    const uint64 largestHash = ~uint64{0} >> (1 + std::bit_width(size));
+    for (size_t i = first; i < length; i += kGroup<Character>)
     {
         group = groupAt(text + i);
         all |= group;
