@@ -205,7 +205,7 @@ TEST(CmBTree, LosesItsRootWithTheLastKey)
 class BTreeOrderTest : public testing::TestWithParam<int>
 {
 };
-INSTANTIATE_TEST_SUITE_P(Orders, BTreeOrderTest, testing::Values(3, 4, 5, 6, 7, 10));
+INSTANTIATE_TEST_SUITE_P(Orders, BTreeOrderTest, testing::Values(3, 4, 5, 6, 7, 10, CmBTree::kDefaultOrder));
 
 TEST_P(BTreeOrderTest, StaysSoundAndSortedUnderRandomWork)
 {

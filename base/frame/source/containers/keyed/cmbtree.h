@@ -13,8 +13,11 @@ class CmBTree : public CmContainer
 {
     DECLARE_CLASS(CmBTree, CmContainer)
 
+    /// Measured as best for texts and numbers, few and many; such nodes still fit the pool of small blocks.
+    static constexpr int kDefaultOrder = 12;
+
     /// An order below 3 becomes 3.
-    explicit CmBTree(int order = 10);
+    explicit CmBTree(int order = kDefaultOrder);
     CmBTree(const CmBTree& other);
     CmBTree& operator=(const CmBTree& other) { return assign(*this, other); }
     ~CmBTree() override;

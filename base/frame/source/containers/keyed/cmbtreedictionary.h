@@ -10,7 +10,7 @@ class CmBTreeDictionary : public CmDictionaryOf<CmBTree>
 {
     DECLARE_CLASS(CmBTreeDictionary, CmBTree)
 
-    explicit CmBTreeDictionary(int order = 10) : CmDictionaryOf(order) {}
+    explicit CmBTreeDictionary(int order = kDefaultOrder) : CmDictionaryOf(order) {}
     CmBTreeDictionary(const CmBTreeDictionary& other) : CmDictionaryOf(other.getOrder())
     {
         CmContainer::copy(other);
