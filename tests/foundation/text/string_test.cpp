@@ -240,6 +240,27 @@ TEST(String, ConvertsLongTextsToUtf8)
     EXPECT_EQ(plain.text8(), std::string(1000, 'x'));
 }
 
+TEST(String, GrowsByOneCharacterAtATime)
+{
+    String narrow, wide, mixed("a");
+    std::string expected;
+    std::u16string expectedWide;
+    for (char character = 'a'; character <= 'z'; character++)
+    {
+        narrow.append(character).append('\0');
+        wide.append(static_cast<char16>(character)).append(u'\0');
+        if (character > 'a')
+            mixed.append(static_cast<char16>(character)).append('\x8A');
+        expected += character;
+        expectedWide += static_cast<char16>(character);
+        ASSERT_EQ(shape(narrow), "narrow:" + expected) << "a zero adds nothing";
+        ASSERT_EQ(wide.text16(), expectedWide);
+    }
+    EXPECT_EQ(mixed.length(), 51u);
+    EXPECT_EQ(mixed.getChar16(1), u'b');
+    EXPECT_EQ(mixed.getChar16(50), u'\u00e4') << "bytes are widened by the default encoding";
+}
+
 TEST(String, ConvertsPairsAndHalvesOfThemAtEveryPlace)
 {
     const std::pair<std::u16string, std::string> pieces[] = {{u"\u00e9", "\u00e9"},

@@ -55,8 +55,10 @@ public:
     String& append(const char* text, int count = -1);
     String& append(const char16* text, int count = -1);
     String& append(const ConstString& text, int count = -1);
-    String& append(char character, int count = 1);
-    String& append(char16 character, int count = 1);
+    String& append(char character);
+    String& append(char16 character);
+    String& append(char character, int count);
+    String& append(char16 character, int count);
     String& operator+=(const ConstString& text) { return append(text); }
     /// Past the end nothing happens, but an empty text takes it at any index.
     String& insertAt(unsigned index, const char* text, int count = -1);
@@ -168,11 +170,16 @@ private:
     template <class Char>
     String& assignRun(Char character, int count);
     template <class Char>
+    bool hasTextOf() const;
+    template <class Char>
+    String& appendCharacter(Char character);
+    template <class Char>
     String& appendRun(Char character, int count);
     template <class Char>
     String& appendText(const Char* text, unsigned count);
     template <class Char>
     Char* extend(unsigned count);
+    bool enlarge(std::size_t size);
     template <class Char>
     String& splice(unsigned index, unsigned removed, const Char* text, unsigned count);
     template <class Char>

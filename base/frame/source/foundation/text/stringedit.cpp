@@ -105,6 +105,24 @@ String& String::assignRun(Char character, int count)
     return *this;
 }
 
+/// Whether there are characters, and of this width.
+template <class Char>
+bool String::hasTextOf() const
+{
+    return len > 0 && (isWide != 0) == kIsWide<Char>;
+}
+
+/// The plain case by itself: texts are often put together character by character.
+template <class Char>
+String& String::appendCharacter(Char character)
+{
+    if (!hasTextOf<Char>() || character == 0)
+        return append(character, 1);
+    if (Char* place = extend<Char>(1))
+        *place = character;
+    return *this;
+}
+
 template <class Char>
 String& String::appendRun(Char character, int count)
 {
@@ -129,6 +147,18 @@ String& String::appendText(const Char* text, unsigned count)
     return *this;
 }
 
+/// Lets the buffer have at least as many bytes. Blocks come in steps of some bytes: one that is large enough as it is
+/// would come back unchanged.
+inline bool String::enlarge(std::size_t size)
+{
+    if (size <= blockSizeOf(buffer))
+        return true;
+    void* larger = std::realloc(buffer, size);
+    if (larger)
+        buffer = larger;
+    return larger != nullptr;
+}
+
 /// Lets the text, which has this width, be longer by as many characters; gives the place of the first of them.
 template <class Char>
 Char* String::extend(unsigned count)
@@ -136,15 +166,8 @@ Char* String::extend(unsigned count)
     const std::size_t newLength = std::size_t{len} + count;
     if (newLength > kMaxTextLength)
         return nullptr;
-    // Blocks come in steps of some characters: one that is large enough as it is would come back unchanged.
-    const std::size_t size = (newLength + 1) * sizeof(Char);
-    if (size > blockSizeOf(buffer))
-    {
-        void* longer = std::realloc(buffer, size);
-        if (!longer)
-            return nullptr;
-        buffer = longer;
-    }
+    if (!enlarge((newLength + 1) * sizeof(Char)))
+        return nullptr;
     Char* place = chars<Char>() + len;
     place[count] = 0;
     len = static_cast<unsigned>(newLength) & kMaxTextLength;
@@ -318,6 +341,16 @@ String& String::append(const char16* text, int count)
 String& String::append(const ConstString& text, int count)
 {
     return insertAt(len, text, count);
+}
+
+String& String::append(char character)
+{
+    return appendCharacter(character);
+}
+
+String& String::append(char16 character)
+{
+    return appendCharacter(character);
 }
 
 String& String::append(char character, int count)
