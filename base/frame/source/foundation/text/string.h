@@ -1,8 +1,10 @@
 #pragma once
 
+#include "foundation/text/charwidth.h"
 #include "foundation/text/conststring.h"
 
 #include <cstdarg>
+#include <cstring>
 
 class IAttributes;
 
@@ -51,7 +53,15 @@ public:
     String& assign(char16 character, int count = 1);
     /// Gives it `count` narrow characters, none of which is zero or its own. The block stays where it is large enough:
     /// for a text that is filled again and again.
-    String& refill(const char* text, unsigned count);
+    String& refill(const char* text, unsigned count)
+    {
+        if (count == 0 || count > len || isWide)
+            return refillBlock(text, count);
+        memcpy(buffer, text, count);
+        static_cast<char*>(buffer)[count] = 0;
+        len = count & kMaxTextLength;
+        return *this;
+    }
     String& append(const char* text, int count = -1);
     String& append(const char16* text, int count = -1);
     String& append(const ConstString& text, int count = -1);
@@ -154,6 +164,7 @@ private:
     char* chars8() { return chars<char>(); }
     char16* chars16() { return chars<char16>(); }
 
+    String& refillBlock(const char* text, unsigned count);
     /// Brings a narrow text from the default encoding into another one.
     bool recode(unsigned encoding);
     /// Takes the wide form of bytes that may be those of this text.

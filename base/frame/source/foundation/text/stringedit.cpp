@@ -316,9 +316,9 @@ String& String::assign(char16 character, int count)
     return assignRun(character, count);
 }
 
-String& String::refill(const char* text, unsigned count)
+String& String::refillBlock(const char* text, unsigned count)
 {
-    const bool fits = count > 0 && ((count == len && !isWide) || count < blockSizeOf(buffer));
+    const bool fits = count > 0 && count < blockSizeOf(buffer);
     if (!fits && (!resize(count, false) || count == 0))
         return *this;
     std::memcpy(buffer, text, count);

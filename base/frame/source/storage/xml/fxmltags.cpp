@@ -187,6 +187,8 @@ bool FXmlParser::readAttributes(FXmlAttributeList& attributes, Token& ending)
     while (true)
     {
         takePlainAttributes(attributes);
+        if (takePlainTagEnd(ending))
+            return true;
         skipLayout(false);
         if (takePlainTagEnd(ending))
             return true;

@@ -151,10 +151,11 @@ void FXmlParser::skipLayout(bool areBlanksData)
         const char* const limit = buffer + buffer.getFillSize();
         for (; place < limit; place++)
         {
-            const bool isLine = isLineEnd(*place) && place + 1 < limit && !isLineEnd(place[1]);
-            if (!isLine && (areBlanksData || !isBlank(*place)))
+            if (isBlank(*place) && !areBlanksData)
+                continue;
+            if (!isLineEnd(*place) || place + 1 == limit || isLineEnd(place[1]))
                 break;
-            line += isLine ? 1 : 0;
+            line++;
         }
         bufferPos = static_cast<uint32>(place - buffer.ptr());
         if (place == limit)
