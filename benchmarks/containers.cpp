@@ -3,8 +3,8 @@
 // Sizes count elements. Keys are 16-bit texts "Item 0123456" in shuffled order, and numbers for the B-tree; all are
 // made beforehand, and what is looked for is equal to what is stored, but not the same. All containers hold
 // references. The tables are made for their number of elements, but for those that grow, which begin small: ours with
-// one and a half times as many buckets, a prime, where Qt takes at least twice as many. The B-tree has the default order. A case's time is that for all elements, but for the
-// removals from the middle of an array, which are a hundred.
+// one and a half times as many buckets, a prime, where Qt takes at least twice as many. The B-tree has the default
+// order. A case's time is that for all elements, but for the removals from the middle of an array, which are a hundred.
 
 #include "containers/keyed/cmbtree.h"
 #include "containers/keyed/cmhashdictionary.h"

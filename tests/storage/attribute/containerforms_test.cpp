@@ -245,6 +245,48 @@ TEST(DictionaryForms, ARestoredPairGoesOverToItsDictionary)
     EXPECT_EQ(object->getRefCount(), references);
 }
 
+TEST(DictionaryForms, ARestoredPairLivesAsLongAsItStandsInItsAssociation)
+{
+    const IPtr<CmString> key = adopt(new CmString("key")), object = adopt(new CmString("object"));
+    const IPtr<CmString> other = adopt(new CmString("other"));
+    FAttributes attributes;
+    CmAssociation(key, object).storeAttributes(attributes);
+    const unsigned references = key->getRefCount();
+    const unsigned otherReferences = other->getRefCount();
+    {
+        CmAssociation restored;
+        EXPECT_TRUE(restored.restoreAttributes(attributes));
+        {
+            CmAssociation copy(restored), assigned;
+            assigned = copy;
+            copy = static_cast<const CmAssociation&>(copy);
+            EXPECT_EQ(key->getRefCount(), references + 3);
+            EXPECT_EQ(object->getRefCount(), references + 3);
+        }
+        restored.setKey(key);
+        restored.setObject(other);
+        EXPECT_EQ(key->getRefCount(), references + 1);
+        EXPECT_EQ(object->getRefCount(), references);
+        restored.setKey(nullptr);
+        EXPECT_EQ(key->getRefCount(), references);
+    }
+    {
+        // Whoever makes the dictionary an owner afterwards leaves it what the pair held.
+        CmHashDictionary dictionary;
+        auto* restored = new CmAssociation;
+        EXPECT_TRUE(restored->restoreAttributes(attributes));
+        EXPECT_TRUE(dictionary.add(restored));
+        dictionary.takeElements();
+        other->addRef();
+        EXPECT_TRUE(dictionary.replace(key, other));
+        EXPECT_EQ(object->getRefCount(), references);
+        EXPECT_TRUE(dictionary.remove(key));
+    }
+    EXPECT_EQ(key->getRefCount(), references);
+    EXPECT_EQ(object->getRefCount(), references);
+    EXPECT_EQ(other->getRefCount(), otherReferences);
+}
+
 TEST(CmUIDForms, AreItsDigits)
 {
     const CmUID uid(FUID(0x00112233, 0x44556677, 0x8899AABB, 0xCCDDEEFF));

@@ -42,7 +42,7 @@ class CmAssociation : public CmObject
     bool restoreAttributes(FAttributes& attributes) override;
 
     /// A place for the chain of a hash table, which lies beside key and object; null where there is none. It is free
-    /// while it names no object.
+    /// while it names no object. Beware: tables that share an association share this node, and so belong to one thread.
     virtual CmHashNode* ownNode() { return nullptr; }
 
 private:

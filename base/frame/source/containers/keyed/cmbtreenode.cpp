@@ -36,8 +36,8 @@ void CmBTreeNode::dispose(CmBTreeNode* node)
     BlockPool::giveBack(node, blockSize(static_cast<size_t>(keysEnd - node->keys)));
 }
 
-// Both searches go from key to key. That asks for more comparisons than halving, but the processor guesses their outcome
-// right more often, and meanwhile the next key and the child that may follow come from memory.
+// Both searches go from key to key. That asks for more comparisons than halving, but the processor guesses their
+// outcome right more often, and meanwhile the next key and the child that may follow come from memory.
 
 int CmBTreeNode::shouldGo(const CmObject* object) const
 {

@@ -57,5 +57,6 @@ private:
         CmObject* object;
     };
 
+    Pair takeOver(CmObject* element) const;
     void giveUp(const Pair& pair);
 };

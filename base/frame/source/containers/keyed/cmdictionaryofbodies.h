@@ -38,7 +38,7 @@ bool CmDictionaryOf<Container, Association>::remove(CmObject* key)
     CmObject* association = key ? Container::takeEqual(&probe) : nullptr;
     if (!association)
         return false;
-    const Pair pair(association);
+    const Pair pair = takeOver(association);
     this->testDelete(association);
     giveUp(pair);
     return true;
@@ -49,7 +49,7 @@ bool CmDictionaryOf<Container, Association>::remove(const CmIterator& position)
 {
     if (!position.walksOver(this) || position.done())
         return false;
-    const Pair pair(position.current());
+    const Pair pair = takeOver(position.current());
     Container::remove(position);
     giveUp(pair);
     return true;
@@ -61,7 +61,7 @@ bool CmDictionaryOf<Container, Association>::removeAt(int index)
     CmObject* association = this->at(index);
     if (!association)
         return false;
-    const Pair pair(association);
+    const Pair pair = takeOver(association);
     Container::removeAt(index);
     giveUp(pair);
     return true;
@@ -72,7 +72,7 @@ void CmDictionaryOf<Container, Association>::removeAll()
 {
     std::vector<Pair> pairs;
     for (std::unique_ptr<CmIterator> it(this->newIterator()); !it->done();)
-        pairs.emplace_back(it->next());
+        pairs.push_back(takeOver(it->next()));
     // The pairs are out before they are released: a destructor may look at this dictionary.
     Container::removeAll();
     for (const Pair& pair : pairs)
@@ -85,7 +85,7 @@ bool CmDictionaryOf<Container, Association>::replace(const CmObject* key, CmObje
     CmAssociation* association = lookupAssoc(key);
     if (!association)
         return false;
-    CmObject* replaced = association->getObject();
+    CmObject* replaced = takeOver(association).object;
     // An object that takes its own place must not be released for it.
     if (replaced == newObject)
         return true;
@@ -154,6 +154,16 @@ bool CmDictionaryOf<Container, Association>::addRestored(CmObject* element)
     if (association->getObject())
         association->getObject()->addRef();
     return true;
+}
+
+// A pair that was added in mode 0 may still hold what it was restored with, which is the dictionary's by now.
+template <class Container, class Association>
+auto CmDictionaryOf<Container, Association>::takeOver(CmObject* element) const -> Pair
+{
+    const Pair pair(element);
+    if (this->_ownsObjects != CmContainer::kShared)
+        pair.association->handOver();
+    return pair;
 }
 
 // What an association that has left held; in mode 0 the association itself is still to be released.

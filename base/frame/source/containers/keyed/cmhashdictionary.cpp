@@ -2,11 +2,11 @@
 
 #include "containers/keyed/cmdictionaryofbodies.h"
 
-template class CmDictionaryOf<CmHashTable, CmHashAssociation>;
+template class CmDictionaryOf<CmAssociationTable, CmHashAssociation>;
 
 DEFINE_CLASS(CmHashDictionary, CmHashTable)
 
-CmHashNode* CmHashDictionary::makeNode(CmObject* object)
+CmHashNode* CmAssociationTable::makeNode(CmObject* object)
 {
     // An association may stand in several dictionaries, but its own node only in one.
     CmHashNode* node = static_cast<CmAssociation*>(object)->ownNode();
@@ -16,7 +16,7 @@ CmHashNode* CmHashDictionary::makeNode(CmObject* object)
     return node;
 }
 
-void CmHashDictionary::dropNode(CmHashNode* node)
+void CmAssociationTable::dropNode(CmHashNode* node)
 {
     if (static_cast<CmAssociation*>(node->object)->ownNode() != node)
         return CmHashTable::dropNode(node);

@@ -9,6 +9,8 @@ class CmHashAssociation final : public CmAssociation
 {
 public:
     using CmAssociation::CmAssociation;
+    CmHashAssociation(const CmHashAssociation&) = delete;
+    CmHashAssociation& operator=(const CmHashAssociation&) = delete;
 
     CmHashNode* ownNode() override { return &node; }
 
@@ -16,12 +18,23 @@ private:
     CmHashNode node = {};
 };
 
-extern template class CmDictionaryOf<CmHashTable, CmHashAssociation>;
+/// A table of CmAssociations, which may bring their nodes along. It stands between CmHashTable and CmHashDictionary, and
+/// is no class of the object model. One thread at a time.
+class CmAssociationTable : public CmHashTable
+{
+protected:
+    using CmHashTable::CmHashTable;
+
+    CmHashNode* makeNode(CmObject* object) override;
+    void dropNode(CmHashNode* node) override;
+};
+
+extern template class CmDictionaryOf<CmAssociationTable, CmHashAssociation>;
 
 /// The dictionary for text keys, found by hash. One thread at a time.
 ///
 /// A hash function that is set gets associations.
-class CmHashDictionary : public CmDictionaryOf<CmHashTable, CmHashAssociation>
+class CmHashDictionary : public CmDictionaryOf<CmAssociationTable, CmHashAssociation>
 {
     DECLARE_CLASS(CmHashDictionary, CmHashTable)
 
@@ -30,11 +43,5 @@ class CmHashDictionary : public CmDictionaryOf<CmHashTable, CmHashAssociation>
     {
         CmContainer::copy(other);
     }
-    // While the nodes are still known as its own.
-    ~CmHashDictionary() override { CmDictionaryOf::removeAll(); }
     CmHashDictionary& operator=(const CmHashDictionary& other) { return assign(*this, other); }
-
-protected:
-    CmHashNode* makeNode(CmObject* object) override;
-    void dropNode(CmHashNode* node) override;
 };

@@ -101,7 +101,10 @@ bool CmHashTable::growIfCrowded()
 
 bool CmHashTable::addTo(CmHashBucket& bucket, CmObject* object)
 {
-    append(bucket, makeNode(object));
+    CmHashNode* node = makeNode(object);
+    if (!node)
+        return false;
+    append(bucket, node);
     _total++;
     testRemember(object);
     return true;

@@ -3,6 +3,8 @@
 #include "containers/sequence/cmcontainer.h"
 #include "containers/sequence/cmiterator.h"
 
+#include <new>
+
 /// A place in a chain of a CmHashTable.
 struct CmHashNode
 {
@@ -70,8 +72,8 @@ protected:
     bool addUnique(CmObject* object);
     /// Takes out the first equal element and gives it, with its reference; null where there is none.
     CmObject* takeEqual(const CmObject* object);
-    /// A node for `object`, which is going to stand in the table. Throws where there is no memory.
-    virtual CmHashNode* makeNode(CmObject* object) { return new CmHashNode{nullptr, object}; }
+    /// A node for `object`, which is going to stand in the table; null where there is no memory.
+    virtual CmHashNode* makeNode(CmObject* object) { return new (std::nothrow) CmHashNode{nullptr, object}; }
     /// For a node whose object is alive, but no longer in the table.
     virtual void dropNode(CmHashNode* node) { delete node; }
 

@@ -8,7 +8,9 @@
 #include <mutex>
 #include <utility>
 
-#if defined(__SANITIZE_ADDRESS__) || defined(__SANITIZE_THREAD__)
+// A test looks at the pool itself also under a sanitizer.
+#if defined(BLOCK_POOL_IS_TESTED)
+#elif defined(__SANITIZE_ADDRESS__) || defined(__SANITIZE_THREAD__)
 #define BLOCK_POOL_IS_MALLOC 1
 #elif defined(__has_feature)
 #if __has_feature(address_sanitizer) || __has_feature(thread_sanitizer)
@@ -40,7 +42,7 @@ constexpr std::size_t kSizes = BlockPool::kLargest / kStep;
 constexpr std::size_t kSlabSize = 64 * 1024;
 constexpr std::size_t kSlabsAtATime = 16;
 constexpr std::size_t kLine = 64;
-/// The heads of neighbouring slabs lie at different lines, or they would all compete for the same few places in a cache.
+/// The heads of neighbouring slabs lie at different lines, or all would compete for the same few places in a cache.
 constexpr std::size_t kHeadPlaces = 32;
 /// Fresh blocks are handed out by and by, so that only memory that is used is touched.
 constexpr std::size_t kStretch = 4096;
@@ -59,13 +61,13 @@ struct alignas(kLine) Slab
 {
     ThreadPool* owner;
     FreeBlock* free;
-    /// Behind the blocks that were handed out at least once.
+    /// Behind the blocks that were made free at least once.
     char* fresh;
     Slab* next;
     Slab* previous;
     unsigned index;
     unsigned taken;
-    /// Whether it is in none of its pool's lists.
+    /// Whether it has no free block, and is neither current nor among the others.
     bool isFull;
 };
 
@@ -123,6 +125,9 @@ public:
         }
     }
 
+    /// Collects what others returned, and gives up all slabs without taken blocks. For a pool that no thread uses.
+    void tidyUp();
+
     /// For whoever keeps the pool while no thread has it.
     ThreadPool* next = nullptr;
 
@@ -160,6 +165,9 @@ public:
     /// Null without memory, as `takePool`.
     Slab* takeSlab()
     {
+        if (Slab* slab = take(slabs))
+            return slab;
+        tidyUpPools();
         Slab* slab = take(slabs);
         return slab ? slab : makeSlabs();
     }
@@ -184,6 +192,8 @@ private:
         const std::lock_guard<std::mutex> guard(lock);
         kept->next = std::exchange(first, kept);
     }
+    /// What has come back to pools of ended threads may be whole slabs.
+    void tidyUpPools();
     /// Keeps all but the first one.
     Slab* makeSlabs();
 
@@ -205,10 +215,26 @@ struct ThreadEnd
     ~ThreadEnd()
     {
         isOver = true;
+        threadPool->tidyUp();
         store.put(std::exchange(threadPool, nullptr));
     }
 };
 thread_local ThreadEnd threadEnd;
+
+void Store::tidyUpPools()
+{
+    ThreadPool* pool = nullptr;
+    {
+        const std::lock_guard<std::mutex> guard(lock);
+        pool = std::exchange(pools, nullptr);
+    }
+    while (pool)
+    {
+        ThreadPool* tidied = std::exchange(pool, pool->next);
+        tidied->tidyUp();
+        put(tidied);
+    }
+}
 
 Slab* Store::makeSlabs()
 {
@@ -257,6 +283,14 @@ void ThreadPool::collectReturned()
         FreeBlock* collected = std::exchange(block, block->next);
         giveBack(collected, slabOf(collected));
     }
+}
+
+void ThreadPool::tidyUp()
+{
+    collectReturned();
+    for (Slab*& slab : current)
+        if (slab->owner && slab->taken == 0)
+            store.put(std::exchange(slab, &noBlocks));
 }
 
 /// Null without memory.

@@ -7,8 +7,10 @@
 ///
 /// Each thread has slabs of memory, each for blocks of one size, so that taking and returning a block costs a few
 /// instructions, and a block has no header. Blocks come from one slab until it has none left: what is made together
-/// lies together, even where many blocks came back in any order before. A block that another thread returns goes back
-/// to its slab. Slabs without taken blocks serve any size and thread; memory is never given back to the system.
+/// lies together, even where many blocks came back in any order before. A block that another thread returns waits
+/// until the thread that took it runs out of blocks, or has ended and memory is asked for. Slabs without taken blocks
+/// then serve any size and thread, but for the one of each size that its thread takes from; memory is never given back
+/// to the system.
 /// Blocks of more than `kLargest` bytes, and with the address or the thread sanitizer all blocks, come from `malloc`,
 /// so that these tools see what they are made for. Thread-safe.
 namespace BlockPool
