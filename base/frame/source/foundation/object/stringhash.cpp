@@ -7,16 +7,18 @@
 namespace
 {
 // The rule: every character is followed by the remainder, in 32 bits. Up to `kLargestShared` buckets nothing passes 32
-// bits there, so that a remainder may as well be taken seldom, as long as nothing passes 64 bits. Groups of as many
-// characters as fit 64 bits are summed up independently of each other; to put one behind a hash, the hash is multiplied
-// by 64 to the power of their number, or by the remainder of that, which leaves more room.
+// bits there, so that a remainder may as well be taken seldom, as long as nothing passes 64 bits. Groups of eight
+// characters are summed up independently of each other, from as many words as they need; to put one behind a hash, the
+// hash is multiplied by 64 to the power of eight, or by the remainder of that, which leaves more room.
 constexpr unsigned kLargestShared = 1u << 25;
+constexpr unsigned kGroup = 8;
+constexpr uint64 kBehindGroup = uint64{1} << 6 * kGroup;
 
+/// The characters in a word, and how far what stands before them is shifted.
 template <class Character>
-constexpr unsigned kGroup = sizeof(uint64) / sizeof(Character);
-
+constexpr unsigned kWord = sizeof(uint64) / sizeof(Character);
 template <class Character>
-constexpr uint64 kBehindGroup = uint64{1} << 6 * kGroup<Character>;
+constexpr unsigned kShift = 6 * kWord<Character>;
 
 uint32 widened(char character)
 {
@@ -38,52 +40,66 @@ unsigned hashByRule(const Character* text, size_t length, unsigned size)
 }
 
 template <class Character>
-uint64 groupAt(const Character* text)
+uint64 wordAt(const Character* text)
 {
-    uint64 group;
-    memcpy(&group, text, sizeof(group));
-    return group;
+    uint64 word;
+    memcpy(&word, text, sizeof(word));
+    return word;
 }
 
-/// The first `count` characters as the last ones of a group; the zeros before them add nothing to a hash.
+/// The first `count` characters as the last ones of a word; the zeros before them add nothing to a hash.
 template <class Character>
 uint64 startOf(const Character* text, size_t count, size_t length)
 {
     constexpr unsigned kBits = 8 * sizeof(Character);
-    if (length >= kGroup<Character>)
-        return groupAt(text) << kBits * (kGroup<Character> - count);
-    Character padded[kGroup<Character>] = {};
+    if (length >= kWord<Character>)
+        return wordAt(text) << kBits * (kWord<Character> - count);
+    Character padded[kWord<Character>] = {};
     for (size_t i = 0; i < count; i++)
-        padded[kGroup<Character> - count + i] = text[i];
-    return groupAt(padded);
+        padded[kWord<Character> - count + i] = text[i];
+    return wordAt(padded);
 }
 
 /// Puts the second of two neighbours behind the first, which is in the lower bits: each takes `bits` of them, and the
 /// first counts 2 to the power of `shift` times.
 template <unsigned bits, unsigned shift>
-uint64 joined(uint64 group)
+uint64 joined(uint64 word)
 {
     static_assert(bits == 8 || bits == 16 || bits == 32);
     constexpr uint64 kFirsts = bits == 8    ? 0x00FF00FF00FF00FF
                                : bits == 16 ? 0x0000FFFF0000FFFF
                                             : 0x00000000FFFFFFFF;
-    return ((group & kFirsts) << shift) + (group >> bits & kFirsts);
+    return ((word & kFirsts) << shift) + (word >> bits & kFirsts);
 }
 
-/// The sum of a group whose first character is in the low bits.
+/// The sum of a word whose first character is in the low bits.
 template <class Character>
-uint64 sumOf(uint64 group)
+uint64 sumOf(uint64 word)
 {
     if constexpr (sizeof(Character) == 1)
-        return joined<32, 24>(joined<16, 12>(joined<8, 6>(group)));
-    return joined<32, 12>(joined<16, 6>(group));
+        return joined<32, 24>(joined<16, 12>(joined<8, 6>(word)));
+    return joined<32, 12>(joined<16, 6>(word));
+}
+
+/// The sum of `count` characters in whole words, whose bits are added to `all`.
+template <unsigned count, class Character>
+uint64 sumAt(const Character* text, uint64& all)
+{
+    uint64 sum = 0;
+    for (unsigned i = 0; i < count; i += kWord<Character>)
+    {
+        const uint64 word = wordAt(text + i);
+        all |= word;
+        sum = sumOf<Character>(word) + (sum << kShift<Character>);
+    }
+    return sum;
 }
 
 /// Whether a character counts as negative, so that the text has to go by the rule.
 template <class Character>
-bool hasNegative(uint64 group)
+bool hasNegative(uint64 word)
 {
-    return sizeof(Character) == 1 && (group & 0x8080808080808080) != 0;
+    return sizeof(Character) == 1 && (word & 0x8080808080808080) != 0;
 }
 
 template <class Character>
@@ -93,19 +109,19 @@ unsigned hashText(const Character* text, size_t length, unsigned size)
         return 0;
     if (size > kLargestShared || std::endian::native != std::endian::little)
         return hashByRule(text, length, size);
-    const size_t first = (length - 1) % kGroup<Character> + 1;
-    uint64 group = startOf(text, first, length);
-    uint64 all = group;
-    uint64 hash = sumOf<Character>(group);
-    const uint64 factor = first < length ? kBehindGroup<Character> % size : 0;
+    size_t done = (length - 1) % kWord<Character> + 1;
+    uint64 all = startOf(text, done, length);
+    uint64 hash = sumOf<Character>(all);
+    // As many words as stand before whole groups; these can't pass 64 bits.
+    for (; (length - done) % kGroup != 0; done += kWord<Character>)
+        hash = sumAt<kWord<Character>>(text + done, all) + (hash << kShift<Character>);
+    const uint64 factor = done < length ? kBehindGroup % size : 0;
     const uint64 largestHash = ~uint64{0} >> (1 + std::bit_width(size));
-    for (size_t i = first; i < length; i += kGroup<Character>)
+    for (; done < length; done += kGroup)
     {
-        group = groupAt(text + i);
-        all |= group;
         if (hash > largestHash)
             hash %= size;
-        hash = hash * factor + sumOf<Character>(group);
+        hash = hash * factor + sumAt<kGroup>(text + done, all);
     }
     if (hasNegative<Character>(all))
         return hashByRule(text, length, size);
