@@ -252,3 +252,52 @@ TEST(CmHashDictionary, GrowsForNewKeysAlone)
     EXPECT_TRUE(dictionary.remove(&added));
     dictionary.takeElements();
 }
+
+namespace
+{
+/// A pair that takes any key for its own.
+class OpenPair : public CmAssociation
+{
+    DECLARE_COPYABLE(OpenPair, CmAssociation)
+
+    using CmAssociation::CmAssociation;
+    bool isEqual(const CmObject*) const override { return true; }
+};
+
+unsigned lastBucket(const CmObject* pair, unsigned size)
+{
+    const CmAssociation* association = FCast(CmAssociation, pair);
+    return association && association->getKey() ? size - 1 : 0;
+}
+} // namespace
+
+TEST(CmHashDictionary, AsksPairsThatHaveAnEqualityOfTheirOwn)
+{
+    CmHashDictionary dictionary(1);
+    Item key(1), other(2), object(3);
+    ASSERT_TRUE(dictionary.add(&key, &object));
+    ASSERT_TRUE(dictionary.add(new OpenPair(&other, &other)));
+    const Item unknown(7);
+    EXPECT_EQ(dictionary.lookup(&key), &object);
+    EXPECT_EQ(dictionary.lookup(&unknown), &other);
+    ASSERT_TRUE(dictionary.remove(const_cast<Item*>(&unknown)));
+    EXPECT_FALSE(dictionary.contains(&unknown));
+    EXPECT_TRUE(dictionary.remove(&key));
+    EXPECT_TRUE(dictionary.isEmpty());
+}
+
+TEST(CmHashDictionary, GivesPairsToItsHashFunction)
+{
+    CmHashDictionary dictionary(4);
+    dictionary.setHashFunction(lastBucket);
+    Item first(8), second(5), absent(2), object(3);
+    ASSERT_TRUE(dictionary.add(&first, &object));
+    ASSERT_TRUE(dictionary.add(&second, &object));
+    EXPECT_TRUE(dictionary.contains(&first));
+    EXPECT_FALSE(dictionary.contains(&absent));
+    const auto it = iterate(dictionary);
+    EXPECT_EQ(static_cast<CmAssociation*>(it->next())->getKey(), &first) << "both are in the last bucket";
+    EXPECT_TRUE(dictionary.remove(&first));
+    EXPECT_FALSE(dictionary.remove(&absent));
+    EXPECT_EQ(dictionary.total(), 1);
+}

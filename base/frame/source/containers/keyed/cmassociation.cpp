@@ -66,11 +66,6 @@ unsigned CmAssociation::hash(unsigned size) const
     return key ? key->hash(size) : CmObject::hash(size);
 }
 
-void CmAssociation::handOver()
-{
-    isKeyHeld = isObjectHeld = false;
-}
-
 bool CmAssociation::restorePair(CmObject* restoredKey, CmObject* restoredObject)
 {
     const bool isWhole = restoredKey && restoredObject;

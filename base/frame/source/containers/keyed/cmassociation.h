@@ -29,7 +29,7 @@ class CmAssociation : public CmObject
     void setKey(CmObject* newKey);
     void setObject(CmObject* newObject);
     /// Gives the references on what was restored to the caller, who is going to release key and object.
-    void handOver();
+    void handOver() { isKeyHeld = isObjectHeld = false; }
 
     /// False without a key, as for anything but an association.
     bool isEqual(const CmObject* other) const override;

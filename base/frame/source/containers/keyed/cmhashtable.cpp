@@ -125,7 +125,7 @@ CmObject* CmHashTable::takeEqual(const CmObject* object)
     CmHashNode* predecessor = nullptr;
     for (CmHashNode* node = bucket.first; node; predecessor = node, node = node->next)
         if (node->object->isEqual(object))
-            return unlink(bucket, predecessor, node);
+            return take(bucket, predecessor, node);
     return nullptr;
 }
 
@@ -140,7 +140,7 @@ bool CmHashTable::remove(const CmIterator& position)
     while (predecessor && predecessor->next != node)
         predecessor = predecessor->next;
     cursor.advance();
-    testDelete(unlink(bucket, predecessor, node));
+    testDelete(take(bucket, predecessor, node));
     return true;
 }
 
@@ -157,7 +157,7 @@ void CmHashTable::removeAll()
 {
     for (int i = 0; i < _size; i++)
         while (CmHashNode* node = _buckets[i].first)
-            testDelete(unlink(_buckets[i], nullptr, node));
+            testDelete(take(_buckets[i], nullptr, node));
 }
 
 CmObject* CmHashTable::lookup(const CmObject* object) const
@@ -208,13 +208,9 @@ unsigned CmHashTable::bucketNumber(const CmObject* object, int size) const
     return _hashFunction ? _hashFunction(object, count) : object->hash(count);
 }
 
-CmObject* CmHashTable::unlink(CmHashBucket& bucket, CmHashNode* predecessor, CmHashNode* node)
+CmObject* CmHashTable::take(CmHashBucket& bucket, CmHashNode* predecessor, CmHashNode* node)
 {
-    (predecessor ? predecessor->next : bucket.first) = node->next;
-    if (bucket.last == node)
-        bucket.last = predecessor;
-    bucket.count--;
-    _total--;
+    unlink(bucket, predecessor, node);
     CmObject* object = node->object;
     dropNode(node);
     return object;

@@ -76,6 +76,10 @@ protected:
     virtual CmHashNode* makeNode(CmObject* object) { return new (std::nothrow) CmHashNode{nullptr, object}; }
     /// For a node whose object is alive, but no longer in the table.
     virtual void dropNode(CmHashNode* node) { delete node; }
+    HashFunction hashFunction() const { return _hashFunction; }
+    CmHashBucket& bucketAt(unsigned number) const { return _buckets[number]; }
+    /// Takes `node` out of its chain, and leaves it as it is. `predecessor` is null for the first of a chain.
+    void unlink(CmHashBucket& bucket, CmHashNode* predecessor, CmHashNode* node);
 
 private:
     friend class CmHashTableIterator;
@@ -85,14 +89,23 @@ private:
     /// Whether the number of buckets has changed.
     bool growIfCrowded();
     bool addTo(CmHashBucket& bucket, CmObject* object);
-    /// `predecessor` is null for the first of a chain. Gives the object, whose reference is then the caller's.
-    CmObject* unlink(CmHashBucket& bucket, CmHashNode* predecessor, CmHashNode* node);
+    /// As unlink, and drops the node. Gives its object, whose reference is then the caller's.
+    CmObject* take(CmHashBucket& bucket, CmHashNode* predecessor, CmHashNode* node);
 
     bool _autoResize = false;
     int32 _total = 0;
     CmHashBucket* _buckets = nullptr;
     HashFunction _hashFunction = nullptr;
 };
+
+inline void CmHashTable::unlink(CmHashBucket& bucket, CmHashNode* predecessor, CmHashNode* node)
+{
+    (predecessor ? predecessor->next : bucket.first) = node->next;
+    if (bucket.last == node)
+        bucket.last = predecessor;
+    bucket.count--;
+    _total--;
+}
 
 /// Walks over a CmHashTable. Going backwards costs a walk through a chain. One thread at a time.
 class CmHashTableIterator : public CmIterator

@@ -12,9 +12,9 @@ bool CmString::isEqual(const CmObject* other) const
     const CmString* text = FCastLikely(CmString, other);
     if (!text)
         return CmObject::isEqual(other);
-    if (isWide && text->isWide && len == text->len)
-        return len == 0 || memcmp(buffer, text->buffer, len * sizeof(char16)) == 0;
-    return FString::compare(*text) == 0;
+    if (!isWide || !text->isWide || len != text->len)
+        return FString::compare(*text) == 0;
+    return len == 0 || memcmp(buffer, text->buffer, len * sizeof(char16)) == 0;
 }
 
 int CmString::compare(const CmObject* other) const
