@@ -197,23 +197,38 @@ void FXmlParser::handlePI()
     recycle(attributes);
 }
 
-// Each '&' is looked at once; the next ';' is looked for only when the last one found has been passed.
 void FXmlParser::removeEntities(char* text, bool* sawHighBit, bool windowsTable)
 {
-    char* from = text ? strchr(text, '&') : nullptr;
-    char* semicolon = from;
-    for (char* to = from; from; to++)
+    if (text)
+        text[decodeReferences(text, text, sawHighBit, windowsTable)] = 0;
+}
+
+/// Writes the decoded text, not terminated, to `target`, which may lie at the text itself or in front of it. Gives its
+/// length. Each '&' is looked at once; the next ';' is looked for only when the last one found has been passed.
+size_t FXmlParser::decodeReferences(std::string_view text, char* target, bool* sawHighBit, bool windowsTable)
+{
+    const char* from = text.data();
+    const char* const end = from + text.size();
+    const auto find = [end](const char* begin, char c)
+    { return static_cast<const char*>(memchr(begin, c, static_cast<size_t>(end - begin))); };
+
+    char* to = target;
+    const char* reference = find(from, '&');
+    const char* semicolon = reference;
+    while (reference && semicolon)
     {
-        if (*from == '&' && semicolon && semicolon <= from)
-            semicolon = strchr(from, ';');
-        uint8 character = 0;
-        if (*from == '&' && semicolon)
-            character = decodeXmlEntity(from + 1, static_cast<int>(semicolon - from) - 1, windowsTable);
-        *to = character ? static_cast<char>(character) : *from;
+        if (semicolon <= reference)
+            semicolon = find(reference, ';');
+        const int length = semicolon ? static_cast<int>(semicolon - reference) - 1 : 0;
+        const uint8 character = decodeXmlEntity(reference + 1, length, windowsTable);
+        memmove(to, from, static_cast<size_t>(reference - from));
+        to += reference - from;
+        *to++ = character ? static_cast<char>(character) : '&';
         if (sawHighBit && character >= 0x80)
             *sawHighBit = true;
-        if (!character && *from == 0)
-            return;
-        from = character ? semicolon + 1 : from + 1;
+        from = character ? semicolon + 1 : reference + 1;
+        reference = find(from, '&');
     }
+    memmove(to, from, static_cast<size_t>(end - from));
+    return static_cast<size_t>(to - target + (end - from));
 }

@@ -208,7 +208,8 @@ private:
     void tellComment(TokenText& text, bool report, void* data, bool endOfComment);
     FXmlAttribute* tokenToAttribute(char* token, int64 size);
     FXmlAttribute* makeAttribute(std::string_view name, std::string_view value);
-    FXmlAttribute* decodeAttribute(std::string_view name, char* value);
+    FXmlAttribute* decodeAttribute(std::string_view name, std::string_view value, char* target);
+    static size_t decodeReferences(std::string_view text, char* target, bool* sawHighBit, bool windowsTable);
     void recycle(FXmlAttributeList& attributes);
     void fail(Error code);
 

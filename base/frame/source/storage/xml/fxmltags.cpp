@@ -243,9 +243,7 @@ FXmlAttribute* FXmlParser::takePlainAttribute(const char*& place, const char* li
     const std::string_view text(value, static_cast<size_t>(end - value));
     if (!hasReferences)
         return makeAttribute(name, text);
-    text.copy(tokenBuffer.ptr(), text.size());
-    tokenBuffer.ptr()[text.size()] = 0;
-    return decodeAttribute(name, tokenBuffer.ptr());
+    return decodeAttribute(name, text, tokenBuffer.ptr());
 }
 
 // Gives null where the token is none. The attribute's reference is the caller's until `recycle`.
@@ -263,14 +261,15 @@ FXmlAttribute* FXmlParser::tokenToAttribute(char* token, int64 size)
         end - 1 - value > kMaxAttributeValue)
         return nullptr;
     end[-1] = 0;
-    return decodeAttribute({token, static_cast<size_t>(nameEnd - token)}, value);
+    return decodeAttribute({token, static_cast<size_t>(nameEnd - token)}, value, value);
 }
 
-FXmlAttribute* FXmlParser::decodeAttribute(std::string_view name, char* value)
+/// The decoded value goes to `target`, as in `decodeReferences`.
+FXmlAttribute* FXmlParser::decodeAttribute(std::string_view name, std::string_view value, char* target)
 {
     bool sawHighBit = false;
-    removeEntities(value, &sawHighBit, (flags & kWindowsEntities) != 0);
-    FXmlAttribute* attribute = makeAttribute(name, value);
+    const size_t length = decodeReferences(value, target, &sawHighBit, (flags & kWindowsEntities) != 0);
+    FXmlAttribute* attribute = makeAttribute(name, {target, length});
     if (sawHighBit && (flags & kWidenValues))
         attribute->value.toWideString(codePage);
     return attribute;
