@@ -3,6 +3,7 @@
 #include "foundation/text/cmstring.h"
 #include "storage/stream/fstream.h"
 #include "storage/xml/fxmlattributelist.h"
+#include "storage/xml/fxmlscan.h"
 #include "storage/xml/fxmltokentext.h"
 #include "storage/xml/xmlentities.h"
 #include "storage/xml/xmltext.h"
@@ -28,7 +29,7 @@ bool isTextEqual(const FString& text, const char* other)
 
 FXmlParser::FXmlParser(FStream* newStream, bool bufferIt)
     : stream(newStream),
-      buffer(bufferIt ? kBufferedBlock : 1),
+      buffer((bufferIt ? kBufferedBlock : 1) + FXmlScan::kStep),
       blockSize(bufferIt ? kBufferedBlock : 1),
       tokenBuffer(kMaxToken + 1),
       tagName(kMaxToken + 1)
@@ -61,6 +62,7 @@ void FXmlParser::setStream(FStream* newStream)
 {
     stream = newStream;
     buffer.setFillSize(0);
+    closeBuffer();
     bufferPos = 0;
     lookAhead = 0;
     line = 1;
@@ -119,7 +121,7 @@ bool FXmlParser::processToken(int startDepth, void* data)
 {
     long long size = 0;
     skipLayout((flags & kKeepSpaces) != 0);
-    if (takePlainEndTag())
+    if (isAtEndTag() && takePlainEndTag())
     {
         endElement(data);
         return !isElementDone(startDepth);

@@ -162,6 +162,7 @@ private:
 
     // Bytes: `lookAhead` is empty while these work
     bool refill();
+    void closeBuffer();
     bool hasByte() { return bufferPos < buffer.getFillSize() || refill(); }
     bool hasBytes(uint32 count);
     char frontByte() const { return buffer.ptr()[bufferPos]; }
@@ -218,8 +219,20 @@ private:
     bool takePlainTagEnd(Token& ending);
     bool takePlainEndTag();
     void takePlainAttributes(FXmlAttributeList& attributes);
-    FXmlAttribute* takePlainAttribute(const char*& place, const char* limit);
-    void passPlain(const char* end);
+    void passPlain(const char* end)
+    {
+        bufferPos = static_cast<uint32>(end - buffer.ptr());
+        lastLineEnd = 0;
+    }
+    bool isAtEndTag() const
+    {
+        const char* const begin = buffer + bufferPos;
+        return begin[0] == '<' && begin[1] == '/';
+    }
+    bool mayProtectQuote(std::string_view value) const
+    {
+        return (flags & kBackslashProtects) && value.find('\\') != value.npos;
+    }
 
     const uint32 blockSize;
     Buffer tokenBuffer;

@@ -1,9 +1,9 @@
 #include "foundation/text/cmstring.h"
 #include "storage/xml/fxmlparser.h"
+#include "storage/xml/fxmlscan.h"
 #include "storage/xml/xmltext.h"
 
 #include <algorithm>
-#include <bit>
 #include <cstring>
 #include <string_view>
 #include <utility>
@@ -13,41 +13,10 @@
 
 namespace
 {
-/// The place in memory of the first byte that isn't 0.
-unsigned firstSet(uint64 bytes)
-{
-    const int bits =
-        std::endian::native == std::endian::little ? std::countr_zero(bytes) : std::countl_zero(bytes);
-    return static_cast<unsigned>(bits) / 8;
-}
-
-/// The first byte that `isEnd` tells; `limit` where there is none. Sixteen bytes are asked together, without a test
-/// between them, which fits in wide registers.
-template <class Predicate>
-const char* findEnd(const char* begin, const char* limit, Predicate isEnd)
-{
-    constexpr int kHalf = sizeof(uint64);
-    for (; limit - begin >= 2 * kHalf; begin += 2 * kHalf)
-    {
-        uint8 ends[2 * kHalf];
-        for (int i = 0; i < 2 * kHalf; i++)
-            ends[i] = isEnd(static_cast<uint8>(begin[i]));
-        uint64 halves[2];
-        memcpy(halves, ends, sizeof(ends));
-        if (halves[0] != 0)
-            return begin + firstSet(halves[0]);
-        if (halves[1] != 0)
-            return begin + kHalf + firstSet(halves[1]);
-    }
-    while (begin < limit && !isEnd(static_cast<uint8>(*begin)))
-        begin++;
-    return begin;
-}
-
 // Calculated without conditions, so that they fit in wide registers.
 
 /// Whether it ends the name of a tag or is one of those that a name doesn't have.
-constexpr auto endsTagName = [](uint8 c) -> uint8
+constexpr auto endsTagName = [](uint8 c) -> bool
 {
     const auto fromSlash = static_cast<uint8>(c ^ '/');
     const auto fromEnd = static_cast<uint8>(c ^ '>');
@@ -55,16 +24,47 @@ constexpr auto endsTagName = [](uint8 c) -> uint8
 };
 
 /// Whether it ends the name of an attribute or is one of those that a name doesn't have.
-constexpr auto endsName = [](uint8 c) -> uint8 { return (c <= ' ') | (c == '='); };
+constexpr auto endsName = [](uint8 c) -> bool { return (c <= ' ') | (c == '='); };
 
-/// Whether it may end a value, or mean something else than itself there. '&' and ''' differ in the lowest bit alone.
-constexpr auto endsValue = [](uint8 c) -> uint8
+/// Whether it ends a value in such quotes, begins a reference, or is one of those that count as lines or end a text.
+/// '&' differs from each of the quotes in one bit, so one comparison finds both.
+template <uint8 quote>
+constexpr auto endsValue = [](uint8 c) -> bool { return (c < ' ') | ((c | (quote ^ '&')) == (quote | '&')); };
+
+/// An attribute that lies whole in the buffer: name="value".
+struct PlainAttribute
 {
-    const auto fromQuote = static_cast<uint8>(c ^ '"');
-    const auto fromBackslash = static_cast<uint8>(c ^ '\\');
-    const auto fromReference = static_cast<uint8>((c & 0xFE) ^ '&');
-    return (c < ' ') | (std::min(std::min(fromQuote, fromBackslash), fromReference) == 0);
+    std::string_view name;
+    std::string_view value;
+    bool hasReferences;
+    const char* end;
 };
+
+/// The first byte that `endsValue` tells.
+const char* findValueEnd(const char* begin, char quote)
+{
+    return quote == '"' ? FXmlScan::findEnd(begin, endsValue<'"'>)
+                        : FXmlScan::findEnd(begin, endsValue<'\''>);
+}
+
+bool findPlainAttribute(const char* begin, PlainAttribute& found)
+{
+    if (*begin == '/' || *begin == '>' || *begin == '?')
+        return false;
+    const char* const equals = FXmlScan::findEnd(begin, endsName);
+    const char quote = *equals == '=' ? equals[1] : '\0';
+    if ((quote != '"' && quote != '\'') || equals == begin || equals - begin > FXmlParser::kMaxAttributeName)
+        return false;
+    const char* const value = equals + 2;
+    const char* end = findValueEnd(value, quote);
+    found.hasReferences = *end == '&';
+    while (*end == '&')
+        end = findValueEnd(end + 1, quote);
+    found.name = {begin, static_cast<size_t>(equals - begin)};
+    found.value = {value, static_cast<size_t>(end - value)};
+    found.end = end + 1;
+    return *end == quote && end - value <= FXmlParser::kMaxAttributeValue;
+}
 } // namespace
 
 // Tags
@@ -104,7 +104,7 @@ CmString* FXmlParser::newTagName()
 {
     if (!spareName || spareName->getRefCount() > 1)
         return new CmString(tagName.ptr());
-    spareName->assign(tagName.ptr());
+    spareName->refill(tagName.ptr(), static_cast<unsigned>(strlen(tagName.ptr())));
     return spareName.take();
 }
 
@@ -129,11 +129,10 @@ void FXmlParser::endElement(void* data)
 bool FXmlParser::takePlainTagName()
 {
     const char* const begin = buffer + bufferPos;
-    const char* const limit = buffer + buffer.getFillSize();
-    if (limit - begin < 2 || begin[0] != '<' || begin[1] == '!' || begin[1] == '/' || begin[1] == '?')
+    if (begin[0] != '<' || begin[1] == '!' || begin[1] == '/' || begin[1] == '?')
         return false;
-    const char* const end = findEnd(begin + 1, limit, endsTagName);
-    const bool isEnd = end < limit && (Xml::isXmlSpace(*end) || *end == '/' || *end == '>');
+    const char* const end = FXmlScan::findEnd(begin + 1, endsTagName);
+    const bool isEnd = Xml::isXmlSpace(*end) || *end == '/' || *end == '>';
     if (!isEnd || end - begin > kMaxToken)
         return false;
     const auto length = static_cast<size_t>(end - begin - 1);
@@ -147,36 +146,27 @@ bool FXmlParser::takePlainTagName()
 bool FXmlParser::takePlainTagEnd(Token& ending)
 {
     const char* const begin = buffer + bufferPos;
-    const char* const limit = buffer + buffer.getFillSize();
-    const bool isEmpty = limit - begin > 1 && begin[0] == '/' && begin[1] == '>';
-    if (!isEmpty && (begin == limit || begin[0] != '>'))
+    const bool isEmpty = begin[0] == '/';
+    if (begin[isEmpty ? 1 : 0] != '>')
         return false;
     ending = isEmpty ? kEmptyTagEnd : kTagEnd;
     passPlain(begin + (isEmpty ? 2 : 1));
     return true;
 }
 
-/// The end of the innermost element.
+/// The end of the innermost element, where an end tag stands.
 bool FXmlParser::takePlainEndTag()
 {
     const char* const begin = buffer + bufferPos;
-    const char* const limit = buffer + buffer.getFillSize();
-    if (limit - begin < 3 || begin[0] != '<' || begin[1] != '/')
-        return false;
     const auto* name = static_cast<CmString*>(tagStack.peek());
     if (!name)
         return false;
     const char* const end = begin + 2 + name->length();
-    if (limit <= end || *end != '>' || memcmp(begin + 2, name->text8(), name->length()) != 0)
+    if (buffer + buffer.getFillSize() <= end || *end != '>' ||
+        memcmp(begin + 2, name->text8(), name->length()) != 0)
         return false;
     passPlain(end + 1);
     return true;
-}
-
-void FXmlParser::passPlain(const char* end)
-{
-    bufferPos = static_cast<uint32>(end - buffer.ptr());
-    lastLineEnd = 0;
 }
 
 // Attributes
@@ -203,47 +193,31 @@ bool FXmlParser::readAttributes(FXmlAttributeList& attributes, Token& ending)
     }
 }
 
+inline FXmlAttribute* FXmlParser::makeAttribute(std::string_view name, std::string_view value)
+{
+    FXmlAttribute* attribute = attributePool.takeLast();
+    if (!attribute)
+        attribute = new FXmlAttribute;
+    attribute->name.refill(name.data(), static_cast<unsigned>(name.size()));
+    attribute->value.refill(value.data(), static_cast<unsigned>(value.size()));
+    return attribute;
+}
+
 /// Those behind blanks, up to the first that the tokenizer has to look at.
 void FXmlParser::takePlainAttributes(FXmlAttributeList& attributes)
 {
-    const char* const limit = buffer + buffer.getFillSize();
     const char* place = buffer + bufferPos;
     while (true)
     {
-        while (place < limit && (*place == ' ' || *place == '\t'))
+        while (*place == ' ' || *place == '\t')
             place++;
-        FXmlAttribute* attribute = takePlainAttribute(place, limit);
-        if (!attribute)
+        PlainAttribute found;
+        if (!findPlainAttribute(place, found) || mayProtectQuote(found.value))
             return passPlain(place);
-        attributes.put(attribute);
+        attributes.put(found.hasReferences ? decodeAttribute(found.name, found.value, tokenBuffer.ptr())
+                                           : makeAttribute(found.name, found.value));
+        place = found.end;
     }
-}
-
-/// name="value", and steps behind it. Null, with `place` where it was, for any other.
-FXmlAttribute* FXmlParser::takePlainAttribute(const char*& place, const char* limit)
-{
-    const char* const begin = place;
-    const char* const equals = findEnd(begin, limit, endsName);
-    if (equals == begin || *begin == '/' || *begin == '>' || *begin == '?' || limit - equals < 2 ||
-        *equals != '=' || (equals[1] != '"' && equals[1] != '\''))
-        return nullptr;
-    const char* const value = equals + 2;
-    const char* end = value;
-    bool hasReferences = false;
-    while ((end = findEnd(end, limit, endsValue)) < limit && *end == '&')
-    {
-        hasReferences = true;
-        end++;
-    }
-    if (end == limit || *end != equals[1] || equals - begin > kMaxAttributeName ||
-        end - value > kMaxAttributeValue)
-        return nullptr;
-    place = end + 1;
-    const std::string_view name(begin, static_cast<size_t>(equals - begin));
-    const std::string_view text(value, static_cast<size_t>(end - value));
-    if (!hasReferences)
-        return makeAttribute(name, text);
-    return decodeAttribute(name, text, tokenBuffer.ptr());
 }
 
 // Gives null where the token is none. The attribute's reference is the caller's until `recycle`.
@@ -272,16 +246,6 @@ FXmlAttribute* FXmlParser::decodeAttribute(std::string_view name, std::string_vi
     FXmlAttribute* attribute = makeAttribute(name, {target, length});
     if (sawHighBit && (flags & kWidenValues))
         attribute->value.toWideString(codePage);
-    return attribute;
-}
-
-FXmlAttribute* FXmlParser::makeAttribute(std::string_view name, std::string_view value)
-{
-    FXmlAttribute* attribute = attributePool.takeLast();
-    if (!attribute)
-        attribute = new FXmlAttribute;
-    attribute->name.refill(name.data(), static_cast<unsigned>(name.size()));
-    attribute->value.refill(value.data(), static_cast<unsigned>(value.size()));
     return attribute;
 }
 

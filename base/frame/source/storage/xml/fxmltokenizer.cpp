@@ -1,4 +1,5 @@
 #include "storage/stream/fstream.h"
+#include "storage/xml/fxmlscan.h"
 #include "storage/xml/fxmltokentext.h"
 #include "storage/xml/xmltext.h"
 
@@ -49,8 +50,8 @@ void FXmlParser::pushFront(char c)
 {
     if (bufferPos > 0)
         buffer.ptr()[--bufferPos] = c;
-    else
-        buffer.move(1, static_cast<uint8>(c));
+    else if (buffer.grow(buffer.getFillSize() + 1 + FXmlScan::kStep) && buffer.move(1, static_cast<uint8>(c)))
+        closeBuffer();
 }
 
 int64 FXmlParser::getStreamPosition() const
@@ -64,13 +65,20 @@ int64 FXmlParser::getStreamPosition() const
 bool FXmlParser::refill()
 {
     const uint32 unread = buffer.getFillSize() - bufferPos;
-    if (!stream || !buffer.grow(unread + blockSize))
+    if (!stream || !buffer.grow(unread + blockSize + FXmlScan::kStep))
         return false;
     memmove(buffer.ptr(), buffer + bufferPos, unread);
     bufferPos = 0;
     const int64 count = stream->readRaw(buffer + unread, blockSize);
     buffer.setFillSize(unread + (count > 0 ? static_cast<uint32>(count) : 0));
+    closeBuffer();
     return count > 0;
+}
+
+// Puts the zeros behind the data at which each search ends. There must be room for them.
+void FXmlParser::closeBuffer()
+{
+    memset(buffer + buffer.getFillSize(), 0, FXmlScan::kStep);
 }
 
 bool FXmlParser::hasBytes(uint32 count)
@@ -101,6 +109,8 @@ bool isLineEnd(char c)
 {
     return c == '\r' || c == '\n';
 }
+
+constexpr auto endsBlanks = [](uint8 c) -> bool { return (c != ' ') & (c != '\t'); };
 
 /// The byte that ends a run, where there is only one.
 struct Is
@@ -149,13 +159,14 @@ void FXmlParser::skipLayout(bool areBlanksData)
     {
         const char* place = buffer + bufferPos;
         const char* const limit = buffer + buffer.getFillSize();
-        for (; place < limit; place++)
+        while (true)
         {
-            if (isBlank(*place) && !areBlanksData)
-                continue;
+            if (!areBlanksData && isBlank(*place))
+                place = FXmlScan::findEnd(place + 1, endsBlanks);
             if (!isLineEnd(*place) || place + 1 == limit || isLineEnd(place[1]))
                 break;
             line++;
+            place++;
         }
         bufferPos = static_cast<uint32>(place - buffer.ptr());
         if (place == limit)
