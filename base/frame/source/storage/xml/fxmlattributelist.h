@@ -16,7 +16,19 @@ class FXmlAttributeList : public CmArray
     {
         if (!makeRoom())
             return false;
-        append(attribute);
+        _objects[_total++] = attribute;
+        return true;
+    }
+    /// Hands its elements to `other`, the last one first. False, with nothing done, where there is no memory.
+    bool giveAllTo(FXmlAttributeList& other)
+    {
+        if (other._size - other._total < _total && !other.setPlaces(other._total + _total))
+            return false;
+        CmObject** place = other._objects + other._total;
+        for (int i = _total; i > 0; i--)
+            *place++ = _objects[i - 1];
+        other._total += _total;
+        _total = 0;
         return true;
     }
     /// Null where there is none.

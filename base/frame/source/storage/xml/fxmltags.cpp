@@ -253,7 +253,8 @@ FXmlAttribute* FXmlParser::decodeAttribute(std::string_view name, std::string_vi
 // that is needed again.
 void FXmlParser::recycle(FXmlAttributeList& attributes)
 {
+    if (attributes.giveAllTo(attributePool))
+        return;
     while (FXmlAttribute* attribute = attributes.takeLast())
-        if (!attributePool.put(attribute))
-            attribute->release();
+        attribute->release();
 }
