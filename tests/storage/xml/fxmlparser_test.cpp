@@ -287,6 +287,16 @@ TEST(FXmlParser, ReadsTheSameWithAndWithoutBuffer)
     EXPECT_EQ(told(text), told(text, 0, false));
 }
 
+TEST(FXmlParser, ReadsTagsThatAnyBlockCuts)
+{
+    const std::string tags = "<some b=\"it's\" c='&lt;\\' longer='" + std::string(30, 'v') +
+                             "'\r\n\t d = \"x\ty\" e=\"\"><z/></some>";
+    const std::string result =
+        "<some b='it's' c='<\\' longer='" + std::string(30, 'v') + "' d='x\ty' e=''><z/></some>";
+    for (size_t before = 2048 - tags.size(); before <= 2048; before++)
+        EXPECT_EQ(told(std::string(before, ' ') + tags), result) << before;
+}
+
 TEST(FXmlParser, PutsBytesBack)
 {
     for (bool buffered : {true, false})

@@ -218,6 +218,7 @@ private:
     bool takePlainTagName();
     bool takePlainTagEnd(Token& ending);
     bool takePlainEndTag();
+    bool readOnInsideTag();
     void takePlainAttributes(FXmlAttributeList& attributes);
     void passPlain(const char* end)
     {

@@ -179,6 +179,8 @@ bool FXmlParser::readAttributes(FXmlAttributeList& attributes, Token& ending)
         takePlainAttributes(attributes);
         if (takePlainTagEnd(ending))
             return true;
+        if (readOnInsideTag())
+            continue;
         skipLayout(false);
         if (takePlainTagEnd(ending))
             return true;
@@ -201,6 +203,13 @@ inline FXmlAttribute* FXmlParser::makeAttribute(std::string_view name, std::stri
     attribute->name.refill(name.data(), static_cast<unsigned>(name.size()));
     attribute->value.refill(value.data(), static_cast<unsigned>(value.size()));
     return attribute;
+}
+
+/// Whether more was read of a tag that goes on behind the buffer, so that its attributes lie whole in there.
+bool FXmlParser::readOnInsideTag()
+{
+    const uint32 unread = buffer.getFillSize() - bufferPos;
+    return blockSize > 1 && unread < kMaxToken && !memchr(buffer + bufferPos, '>', unread) && refill();
 }
 
 /// Those behind blanks, up to the first that the tokenizer has to look at.
