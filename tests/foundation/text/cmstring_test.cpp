@@ -55,6 +55,24 @@ TEST(CmString, IsEqualAndOrderedByItsCharacters)
     EXPECT_TRUE(wideText.isWideString()) << "hashing must not convert";
 }
 
+TEST(CmString, IsEqualWhereEveryCharacterIs)
+{
+    std::u16string text;
+    for (size_t length = 0; length <= 40; text.push_back(static_cast<char16>(u'A' + length++)))
+    {
+        const CmString whole(text.c_str()), same(text.c_str()), longer((text + u'x').c_str());
+        EXPECT_TRUE(whole.isEqual(&same)) << length;
+        EXPECT_FALSE(whole.isEqual(&longer)) << length;
+        for (size_t place = 0; place < length; place++)
+        {
+            std::u16string changed = text;
+            changed[place] = static_cast<char16>(changed[place] ^ 0x100);
+            const CmString other(changed.c_str());
+            EXPECT_FALSE(whole.isEqual(&other)) << length << " characters, changed at " << place;
+        }
+    }
+}
+
 TEST(CmString, CopiesAsAnObject)
 {
     CmStringWithId original("text", 7);

@@ -1,8 +1,8 @@
 #pragma once
 
 #include "foundation/object/types.h"
+#include "foundation/object/wordat.h"
 
-#include <cstring>
 #include <string_view>
 #include <type_traits>
 
@@ -46,11 +46,7 @@ bool isAsciiText(const Char* text, unsigned length)
     unsigned i = 0;
     for (; i + kBlock <= length && bits == 0; i += kBlock)
         for (unsigned k = 0; k < kBlock; k += kTogether)
-        {
-            uint64 word = 0;
-            memcpy(&word, text + i + k, sizeof(word));
-            bits |= word & kAboveAscii<Char>;
-        }
+            bits |= wordAt(text + i + k) & kAboveAscii<Char>;
     for (; i < length && bits == 0; ++i)
         bits = static_cast<std::make_unsigned_t<Char>>(text[i]) & ~uint64{0x7F};
     return bits == 0;

@@ -1,3 +1,4 @@
+#include "foundation/object/wordat.h"
 #include "foundation/text/charwidth.h"
 #include "foundation/text/conststring.h"
 #include "foundation/text/itextservices.h"
@@ -45,14 +46,6 @@ int compareNarrow(const char* a, const char* b, int count, CompareMode mode)
     return mode == kCaseSensitive ? std::strncmp(a, b, limit) : compareFolded(a, b, limit);
 }
 
-/// Four characters, as the number that they are in memory.
-uint64 fourCharacters(const char16* text)
-{
-    uint64 word;
-    std::memcpy(&word, text, sizeof word);
-    return word;
-}
-
 /// The place of the first of four characters that differs.
 unsigned firstDifferentOfFour(uint64 difference)
 {
@@ -70,7 +63,7 @@ unsigned firstDifference(const char16* a, const char16* b, unsigned count)
     const unsigned lastStep = count - kStep;
     for (unsigned i = 0;; i = std::min(i + kStep, lastStep))
     {
-        if (const uint64 difference = fourCharacters(a + i) ^ fourCharacters(b + i))
+        if (const uint64 difference = wordAt(a + i) ^ wordAt(b + i))
             return i + firstDifferentOfFour(difference);
         if (i == lastStep)
             return count;

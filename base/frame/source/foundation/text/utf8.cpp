@@ -1,5 +1,6 @@
 #include "foundation/text/utf8.h"
 
+#include "foundation/object/wordat.h"
 #include "foundation/text/charwidth.h"
 
 #include <bit>
@@ -85,9 +86,7 @@ unsigned countAscii(const Element* text)
     constexpr unsigned kBitsPerElement = 8 * sizeof(Element);
     for (unsigned i = 0; i < kBlock; i += kTogether)
     {
-        uint64 word = 0;
-        memcpy(&word, text + i, sizeof(word));
-        word &= kAboveAscii<Element>;
+        const uint64 word = wordAt(text + i) & kAboveAscii<Element>;
         if (word == 0)
             continue;
         const int bits =
@@ -102,11 +101,7 @@ bool isAsciiBlock(const Element* text)
 {
     uint64 all = 0;
     for (unsigned i = 0; i < size; i += sizeof(uint64) / sizeof(Element))
-    {
-        uint64 word = 0;
-        memcpy(&word, text + i, sizeof(word));
-        all |= word;
-    }
+        all |= wordAt(text + i);
     return (all & kAboveAscii<Element>) == 0;
 }
 
