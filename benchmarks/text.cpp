@@ -161,6 +161,12 @@ void hashOurs(benchmark::State& state)
     hashNames(state, [](const std::string& name) { return hashString8(name.c_str(), 1009); });
 }
 
+/// As a CmString asks, which knows its length as the peer does.
+void hashCountedOurs(benchmark::State& state)
+{
+    hashNames(state, [](const std::string& name) { return hashString8(name.c_str(), name.size(), 1009); });
+}
+
 void hashAbsl(benchmark::State& state)
 {
     hashNames(state, [](const std::string& name) { return absl::Hash<std::string>()(name) % 1009; });
@@ -187,3 +193,5 @@ BENCHMARK(compareOurs)->Name("natural comparison/ours");
 BENCHMARK(compareGlibc)->Name("natural comparison/strverscmp");
 BENCHMARK(hashOurs)->Name("hash of a text/ours");
 BENCHMARK(hashAbsl)->Name("hash of a text/absl");
+BENCHMARK(hashCountedOurs)->Name("hash of a counted text/ours");
+BENCHMARK(hashAbsl)->Name("hash of a counted text/absl");

@@ -5,7 +5,6 @@
 #include "foundation/object/ipersistent.h"
 #include "foundation/object/iptr.h"
 #include "foundation/object/singleton.h"
-#include "foundation/object/stringhash.h"
 
 #include <gtest/gtest.h>
 
@@ -224,48 +223,6 @@ TEST(ClassFactory, NamesComponentsByTheirIdentifier)
     component.hasClassID = false;
     EXPECT_FALSE(factory().getStorageID(&component, result, false));
     EXPECT_EQ(component.references, 1u);
-}
-
-TEST(StringHash, MultipliesBy64WithTheCharactersSign)
-{
-    EXPECT_EQ(hashString8("ab", 1000003), 97u * 64 + 98);
-    EXPECT_EQ(hashString16(u"ab", 1000003), 97u * 64 + 98);
-    EXPECT_EQ(hashString8("ab", 50), (97u % 50 * 64 + 98) % 50);
-    EXPECT_EQ(hashString8("\xE4", 1000), (0xFFFFFFE4u) % 1000);
-    EXPECT_EQ(hashString16(u"\u00E4", 1000), 0xE4u);
-    EXPECT_EQ(hashString8(nullptr, 50), 0u);
-    EXPECT_EQ(hashString16(u"", 50), 0u);
-}
-
-/// What has the remainder taken behind every character.
-template <class Character>
-unsigned hashByTheRule(const std::basic_string<Character>& text, unsigned size)
-{
-    unsigned hash = 0;
-    for (const Character c : text)
-        hash = ((hash << 6) + (sizeof(c) == 1 ? static_cast<unsigned>(static_cast<signed char>(c))
-                                              : static_cast<unsigned>(c))) %
-               size;
-    return hash;
-}
-
-TEST(StringHash, TakesTheRemainderBehindEveryCharacter)
-{
-    const std::string narrow[] = {"a longer name of forty characters or so", std::string(40, '\x7F'),
-                                  "Gr\xC3\xB6\xC3\x9F", "mostly plain, one is not \xFF", "\x80"};
-    const std::u16string wide[] = {u"a longer name of forty characters or so", std::u16string(40, u'\xFFFF'),
-                                   u"Gr\u00F6\u00DFe"};
-    for (const unsigned size : {1u, 2u, 50u, 1021u, 10007u, 1u << 25, (1u << 25) + 1, 0xFFFFFFFFu})
-    {
-        for (const std::string& text : narrow)
-            for (size_t start = 0; start < text.size(); start++)
-                EXPECT_EQ(hashString8(text.c_str() + start, size), hashByTheRule(text.substr(start), size))
-                    << text << " from " << start << " of " << size;
-        for (const std::u16string& text : wide)
-            for (size_t start = 0; start < text.size(); start++)
-                EXPECT_EQ(hashString16(text.c_str() + start, size), hashByTheRule(text.substr(start), size))
-                    << "wide text from " << start << " of " << size;
-    }
 }
 
 TEST(CmDelegatingUnknown, AnswersForItsDelegate)

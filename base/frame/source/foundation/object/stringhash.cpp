@@ -3,6 +3,7 @@
 #include <bit>
 #include <cstring>
 #include <string>
+#include <type_traits>
 
 namespace
 {
@@ -103,12 +104,8 @@ bool hasNegative(uint64 word)
 }
 
 template <class Character>
-unsigned hashText(const Character* text, size_t length, unsigned size)
+unsigned hashWords(const Character* text, size_t length, unsigned size)
 {
-    if (size == 0 || length == 0)
-        return 0;
-    if (size > kLargestShared || std::endian::native != std::endian::little)
-        return hashByRule(text, length, size);
     size_t done = (length - 1) % kWord<Character> + 1;
     uint64 all = startOf(text, done, length);
     uint64 hash = sumOf<Character>(all);
@@ -126,6 +123,108 @@ unsigned hashText(const Character* text, size_t length, unsigned size)
     if (hasNegative<Character>(all))
         return hashByRule(text, length, size);
     return static_cast<unsigned>(hash % size);
+}
+
+// A hash is also the sum of all characters, each times the power of 64 that its place asks for, or times the remainder
+// of that, which may be known beforehand. Plain texts that two blocks of 16 bytes cover are summed up that way: their
+// characters times remainders of 15 bits stay within 32 bits, and compilers turn a sum of products into a few
+// instructions.
+template <class Character>
+constexpr unsigned kBlock = 16 / sizeof(Character);
+constexpr unsigned kLargestFor16Bits = 1u << 15;
+
+/// The remainders of the powers of 64 for one number of buckets, the one that the thread goes on asking for.
+///
+/// To find them takes as long as some twenty hashes, so the number has to be asked for often, and no other meanwhile.
+/// One thread at a time.
+template <class Character>
+class Powers
+{
+public:
+    bool areFor(unsigned buckets)
+    {
+        return buckets == size || (buckets <= kLargestFor16Bits && learn(buckets));
+    }
+
+    /// For the first block of a text of `length` characters; zeros for the characters that the last block has too.
+    const int16* ofFirstBlock(size_t length) const { return first + 2 * kBlock<Character> - length; }
+    const int16* ofLastBlock() const { return last; }
+
+private:
+    static constexpr unsigned kOften = 64;
+
+    bool learn(unsigned buckets);
+
+    /// At first one bucket, for which all remainders are 0.
+    unsigned size = 1;
+    unsigned candidate = 0;
+    unsigned asked = 0;
+    int16 first[2 * kBlock<Character>] = {};
+    int16 last[kBlock<Character>] = {};
+};
+
+template <class Character>
+bool Powers<Character>::learn(unsigned buckets)
+{
+    if (buckets != candidate)
+        asked = 0;
+    candidate = buckets;
+    if (buckets == 0 || ++asked < kOften)
+        return false;
+    size = buckets;
+    uint32 power = 1 % size;
+    for (int16* block : {last, first})
+        for (unsigned i = kBlock<Character>; i-- > 0; power = power * 64 % size)
+            block[i] = static_cast<int16>(power);
+    return true;
+}
+
+template <class Character>
+constinit thread_local Powers<Character> powers;
+
+template <class Character>
+int16 asFactor(Character character)
+{
+    return static_cast<int16>(static_cast<std::make_unsigned_t<Character>>(character));
+}
+
+template <class Character>
+uint32 blockSum(const Character* text, const int16* factors)
+{
+    int32 sum = 0;
+    for (unsigned i = 0; i < kBlock<Character>; i++)
+        sum += asFactor(text[i]) * factors[i];
+    return static_cast<uint32>(sum);
+}
+
+template <class Character>
+bool isBlockPair(size_t length)
+{
+    return length - kBlock<Character> <= kBlock<Character>;
+}
+
+template <class Character>
+unsigned hashBlocks(const Character* text, size_t length, unsigned size)
+{
+    const Powers<Character>& known = powers<Character>;
+    const Character* last = text + length - kBlock<Character>;
+    const uint32 sum = blockSum(text, known.ofFirstBlock(length)) + blockSum(last, known.ofLastBlock());
+    int32 all = 0;
+    for (unsigned i = 0; i < kBlock<Character>; i++)
+        all |= asFactor(text[i]) | asFactor(last[i]);
+    return static_cast<uint32>(all) < 128 ? sum % size : hashWords(text, length, size);
+}
+
+template <class Character>
+unsigned hashText(const Character* text, size_t length, unsigned size)
+{
+    if (isBlockPair<Character>(length) && powers<Character>.areFor(size))
+        return hashBlocks(text, length, size);
+    if (size == 0 || length == 0)
+        return 0;
+    if (size > kLargestShared || std::endian::native != std::endian::little)
+        return hashByRule(text, length, size);
+    return hashWords(text, length, size);
 }
 } // namespace
 
