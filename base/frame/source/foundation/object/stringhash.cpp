@@ -1,5 +1,7 @@
 #include "foundation/object/stringhash.h"
 
+#include "foundation/object/wordat.h"
+
 #include <bit>
 #include <cstring>
 #include <string>
@@ -38,14 +40,6 @@ unsigned hashByRule(const Character* text, size_t length, unsigned size)
     for (size_t i = 0; i < length; i++)
         hash = ((hash << 6) + widened(text[i])) % size;
     return hash;
-}
-
-template <class Character>
-uint64 wordAt(const Character* text)
-{
-    uint64 word;
-    memcpy(&word, text, sizeof(word));
-    return word;
 }
 
 /// The first `count` characters as the last ones of a word; the zeros before them add nothing to a hash.
@@ -206,13 +200,14 @@ bool isBlockPair(size_t length)
 template <class Character>
 unsigned hashBlocks(const Character* text, size_t length, unsigned size)
 {
-    const Powers<Character>& known = powers<Character>;
     const Character* last = text + length - kBlock<Character>;
-    const uint32 sum = blockSum(text, known.ofFirstBlock(length)) + blockSum(last, known.ofLastBlock());
     int32 all = 0;
     for (unsigned i = 0; i < kBlock<Character>; i++)
         all |= asFactor(text[i]) | asFactor(last[i]);
-    return static_cast<uint32>(all) < 128 ? sum % size : hashWords(text, length, size);
+    if (static_cast<uint32>(all) > 127)
+        return hashWords(text, length, size);
+    const Powers<Character>& known = powers<Character>;
+    return (blockSum(text, known.ofFirstBlock(length)) + blockSum(last, known.ofLastBlock())) % size;
 }
 
 template <class Character>
