@@ -41,6 +41,8 @@ FXmlParser::~FXmlParser()
 {
     attributePool.takeElements();
     attributePool.removeAll();
+    spareNames.takeElements();
+    spareNames.removeAll();
     tagStack.removeAll();
 }
 

@@ -238,9 +238,10 @@ private:
     const uint32 blockSize;
     Buffer tokenBuffer;
     Buffer tagName;
-    /// Those of the last tag, for the next one. Null while in use.
+    /// That of the last tag, for the next one. Null while in use.
     IPtr<FXmlAttributeList> spareAttributes;
-    IPtr<CmString> spareName;
+    /// The texts of elements that ended, each with one reference.
+    CmArray spareNames;
     /// The line end that was counted last, while the next byte may still belong to it.
     char lastLineEnd = 0;
 };

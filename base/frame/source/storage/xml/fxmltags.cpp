@@ -99,13 +99,16 @@ void FXmlParser::tellStartTag(FXmlAttributeList& attributes, bool isEmpty, void*
         fail(kErrorUnexpectedTag);
 }
 
-// The last closed element's object again, unless a handler is still looking at that name.
+// The object of an element that was closed, unless a handler is still looking at that name.
 CmString* FXmlParser::newTagName()
 {
-    if (!spareName || spareName->getRefCount() > 1)
+    const int last = spareNames.total() - 1;
+    auto* name = static_cast<CmString*>(spareNames.at(last));
+    if (!name || name->getRefCount() > 1)
         return new CmString(tagName.ptr());
-    spareName->refill(tagName.ptr(), static_cast<unsigned>(strlen(tagName.ptr())));
-    return spareName.take();
+    spareNames.removeAt(last);
+    name->refill(tagName.ptr(), static_cast<unsigned>(strlen(tagName.ptr())));
+    return name;
 }
 
 void FXmlParser::handleEndTag(void* data)
@@ -119,10 +122,11 @@ void FXmlParser::handleEndTag(void* data)
 
 void FXmlParser::endElement(void* data)
 {
-    auto name = adopt(static_cast<CmString*>(tagStack.pop()));
+    auto* name = static_cast<CmString*>(tagStack.pop());
     if (error == kNoError && !skipping && !endTag(name->text8(), data))
         fail(kErrorUnexpectedTag);
-    spareName = std::move(name);
+    if (name && !spareNames.add(name))
+        name->release();
 }
 
 /// The start of a tag up to its attributes; leaves its name in `tagName`.
