@@ -6,6 +6,7 @@
 #include "storage/xml/fxmlattributelist.h"
 
 #include <string_view>
+#include <utility>
 
 class CmString;
 class FStream;
@@ -168,7 +169,11 @@ private:
     char frontByte() const { return buffer.ptr()[bufferPos]; }
     bool startsWith(const char* text, uint32 length);
     void pushFront(char c);
-    void settleLookAhead();
+    void settleLookAhead()
+    {
+        if (lookAhead != 0)
+            pushFront(std::exchange(lookAhead, '\0'));
+    }
     template <class Predicate>
     Run copyUntil(TokenText& token, Predicate ends);
     void skipLayout(bool areBlanksData);
@@ -216,7 +221,16 @@ private:
 
     // What lies whole in the buffer. False or null, with nothing read, where it doesn't
     bool takePlainTagName();
-    bool takePlainTagEnd(Token& ending);
+    bool takePlainTagEnd(Token& ending)
+    {
+        const char* const begin = buffer + bufferPos;
+        const bool isEmpty = begin[0] == '/';
+        ending = isEmpty ? kEmptyTagEnd : kTagEnd;
+        const bool isEnd = begin[isEmpty ? 1 : 0] == '>';
+        if (isEnd)
+            passPlain(begin + (isEmpty ? 2 : 1));
+        return isEnd;
+    }
     bool takePlainEndTag();
     bool readOnInsideTag();
     void takePlainAttributes(FXmlAttributeList& attributes);

@@ -146,18 +146,6 @@ bool FXmlParser::takePlainTagName()
     return true;
 }
 
-/// The '>' or '/>' behind the attributes.
-bool FXmlParser::takePlainTagEnd(Token& ending)
-{
-    const char* const begin = buffer + bufferPos;
-    const bool isEmpty = begin[0] == '/';
-    if (begin[isEmpty ? 1 : 0] != '>')
-        return false;
-    ending = isEmpty ? kEmptyTagEnd : kTagEnd;
-    passPlain(begin + (isEmpty ? 2 : 1));
-    return true;
-}
-
 /// The end of the innermost element, where an end tag stands.
 bool FXmlParser::takePlainEndTag()
 {

@@ -38,14 +38,6 @@ void FXmlParser::ungetChar(char c)
         pushFront(c);
 }
 
-void FXmlParser::settleLookAhead()
-{
-    if (lookAhead == 0)
-        return;
-    pushFront(lookAhead);
-    lookAhead = 0;
-}
-
 void FXmlParser::pushFront(char c)
 {
     if (bufferPos > 0)
@@ -197,10 +189,7 @@ void FXmlParser::skipSpace()
 // For line ends that are no tokens. Each pair of two different ones counts once, also where it comes in two pieces.
 void FXmlParser::countLines(const char* text, size_t length)
 {
-    // Tested as a whole, since most texts have none, the loop fits in wide registers.
-    bool hasLineEnd = lastLineEnd != 0;
-    for (size_t i = 0; i < length; i++)
-        hasLineEnd |= (text[i] == '\n') | (text[i] == '\r');
+    const bool hasLineEnd = lastLineEnd != 0 || memchr(text, '\n', length) || memchr(text, '\r', length);
     if (!hasLineEnd)
         return;
     for (size_t i = 0; i < length; i++)
