@@ -301,3 +301,32 @@ TEST(CmHashDictionary, GivesPairsToItsHashFunction)
     EXPECT_FALSE(dictionary.remove(&absent));
     EXPECT_EQ(dictionary.total(), 1);
 }
+
+TEST(CmHashDictionary, KeepsItsChainsWhole)
+{
+    CmHashDictionary dictionary(1), other(1);
+    Item keys[] = {Item(0), Item(1), Item(2), Item(3)}, object(9);
+    for (Item& key : keys)
+        ASSERT_TRUE(dictionary.add(&key, &object));
+    CmAssociation* shared = dictionary.lookupAssoc(&keys[0]);
+    shared->addRef();
+    ASSERT_TRUE(other.add(shared));
+    EXPECT_TRUE(dictionary.contains(&keys[3])) << "the place in the first chain is still taken";
+    dictionary.lookupAssoc(&keys[1])->setKey(nullptr);
+    EXPECT_FALSE(dictionary.contains(&keys[1]));
+    ASSERT_TRUE(dictionary.remove(&keys[2]));
+    ASSERT_TRUE(dictionary.remove(&keys[3]));
+    ASSERT_TRUE(dictionary.add(&keys[3], &object));
+    EXPECT_TRUE(dictionary.contains(&keys[0]));
+    EXPECT_EQ(dictionary.at(2), dictionary.lookupAssoc(&keys[3]));
+    EXPECT_EQ(dictionary.total(), 3);
+}
+
+TEST(CmHashDictionary, HoldsNothingWithoutBuckets)
+{
+    CmHashDictionary dictionary(0);
+    Item key(1), object(2);
+    EXPECT_FALSE(dictionary.add(&key, &object));
+    EXPECT_FALSE(dictionary.contains(&key));
+    EXPECT_FALSE(dictionary.remove(&key));
+}

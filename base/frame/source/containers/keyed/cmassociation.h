@@ -2,7 +2,7 @@
 
 #include "foundation/object/cmobject.h"
 
-struct CmHashNode;
+class CmHashAssociation;
 
 /// A key with its object, as the dictionaries hold it. Equality, order and hash look at the key alone.
 ///
@@ -41,9 +41,8 @@ class CmAssociation : public CmObject
     bool storeAttributes(FAttributes& attributes) const override;
     bool restoreAttributes(FAttributes& attributes) override;
 
-    /// A place for the chain of a hash table, which lies beside key and object; null where there is none. It is free
-    /// while it names no object. Beware: tables that share an association share this node, and so belong to one thread.
-    virtual CmHashNode* ownNode() { return nullptr; }
+    /// This association where it brings its node in a hash table's chain along; null where it doesn't.
+    virtual CmHashAssociation* withNode() { return nullptr; }
 
 private:
     /// Takes over the references on a whole pair; half a pair is given back, and the result is false.

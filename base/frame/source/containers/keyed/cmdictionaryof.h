@@ -57,9 +57,6 @@ private:
         CmObject* object;
     };
 
-    /// The association with an equal key, and the same taken out of the container. `key` is not null.
-    CmAssociation* findPair(const CmObject* key) const;
-    CmAssociation* takePair(const CmObject* key);
     Pair takeOver(CmObject* element) const;
     void giveUp(const Pair& pair);
 };

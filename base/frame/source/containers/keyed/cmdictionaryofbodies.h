@@ -34,7 +34,8 @@ bool CmDictionaryOf<Container, Association>::add(CmObject* object)
 template <class Container, class Association>
 bool CmDictionaryOf<Container, Association>::remove(CmObject* key)
 {
-    CmAssociation* association = key ? takePair(key) : nullptr;
+    const CmAssociation probe(key);
+    CmObject* association = key ? Container::takeEqual(&probe) : nullptr;
     if (!association)
         return false;
     const Pair pair = takeOver(association);
@@ -103,7 +104,10 @@ CmObject* CmDictionaryOf<Container, Association>::lookupObject(const CmObject* k
 template <class Container, class Association>
 CmAssociation* CmDictionaryOf<Container, Association>::lookupAssoc(const CmObject* key) const
 {
-    return key ? findPair(key) : nullptr;
+    if (!key)
+        return nullptr;
+    const CmAssociation probe(const_cast<CmObject*>(key));
+    return static_cast<CmAssociation*>(Container::lookup(&probe));
 }
 
 template <class Container, class Association>
@@ -150,20 +154,6 @@ bool CmDictionaryOf<Container, Association>::addRestored(CmObject* element)
     if (association->getObject())
         association->getObject()->addRef();
     return true;
-}
-
-template <class Container, class Association>
-CmAssociation* CmDictionaryOf<Container, Association>::findPair(const CmObject* key) const
-{
-    const CmAssociation probe(const_cast<CmObject*>(key));
-    return static_cast<CmAssociation*>(Container::lookup(&probe));
-}
-
-template <class Container, class Association>
-CmAssociation* CmDictionaryOf<Container, Association>::takePair(const CmObject* key)
-{
-    const CmAssociation probe(const_cast<CmObject*>(key));
-    return static_cast<CmAssociation*>(Container::takeEqual(&probe));
 }
 
 // A pair that was added in mode 0 may still hold what it was restored with, which is the dictionary's by now.

@@ -2,24 +2,19 @@
 
 #include "containers/keyed/cmdictionaryofbodies.h"
 
-DEFINE_CLASS(CmHashDictionary, CmHashTable)
-
-template <>
-CmAssociation* CmDictionaryOf<CmAssociationTable, CmHashAssociation>::findPair(const CmObject* key) const
-{
-    return lookupKey(key);
-}
-
-template <>
-CmAssociation* CmDictionaryOf<CmAssociationTable, CmHashAssociation>::takePair(const CmObject* key)
-{
-    return takeKey(key);
-}
-
 template class CmDictionaryOf<CmAssociationTable, CmHashAssociation>;
+
+DEFINE_CLASS(CmHashDictionary, CmHashTable)
 
 namespace
 {
+/// The association's own node, if it has one.
+CmHashNode* nodeOf(CmObject* association)
+{
+    CmHashAssociation* pair = static_cast<CmAssociation*>(association)->withNode();
+    return pair ? pair->ownNode() : nullptr;
+}
+
 bool holds(const CmAssociation* association, const CmObject* key)
 {
     const CmObject* held = association->getKey();
@@ -27,26 +22,22 @@ bool holds(const CmAssociation* association, const CmObject* key)
 }
 } // namespace
 
-CmAssociation* CmAssociationTable::lookupKey(const CmObject* key) const
+CmObject* CmAssociationTable::lookup(const CmAssociation* probe) const
 {
     if (!isSearchedByKey())
-    {
-        const CmAssociation probe(const_cast<CmObject*>(key));
-        return static_cast<CmAssociation*>(CmHashTable::lookup(&probe));
-    }
-    for (CmHashNode* node = bucketAt(key->hash(static_cast<unsigned>(_size))).first; node; node = node->next)
-        if (CmAssociation* association = CmHashAssociation::around(node); holds(association, key))
-            return association;
-    return nullptr;
+        return CmHashTable::lookup(probe);
+    const CmObject* key = probe->getKey();
+    CmHashNode* node = bucketAt(key->hash(static_cast<unsigned>(_size))).first;
+    while (node && !holds(CmHashAssociation::around(node), key))
+        node = node->next;
+    return node ? CmHashAssociation::around(node) : nullptr;
 }
 
-CmAssociation* CmAssociationTable::takeKey(const CmObject* key)
+CmObject* CmAssociationTable::takeEqual(const CmAssociation* probe)
 {
     if (!isSearchedByKey())
-    {
-        const CmAssociation probe(const_cast<CmObject*>(key));
-        return static_cast<CmAssociation*>(takeEqual(&probe));
-    }
+        return CmHashTable::takeEqual(probe);
+    const CmObject* key = probe->getKey();
     CmHashBucket& bucket = bucketAt(key->hash(static_cast<unsigned>(_size)));
     CmHashNode* predecessor = nullptr;
     CmHashNode* node = bucket.first;
@@ -55,26 +46,29 @@ CmAssociation* CmAssociationTable::takeKey(const CmObject* key)
     if (!node)
         return nullptr;
     unlink(bucket, predecessor, node);
+    // What dropNode does for a pair's own node.
     node->object = nullptr;
     return CmHashAssociation::around(node);
 }
 
 CmHashNode* CmAssociationTable::makeNode(CmObject* object)
 {
-    // An association may stand in several dictionaries, but its own node only in one.
-    CmHashNode* own = static_cast<CmAssociation*>(object)->ownNode();
-    CmHashNode* node = own && !own->object ? own : CmHashTable::makeNode(object);
-    if (!node)
-        return nullptr;
-    node->object = object;
-    if (node != own)
+    // An association may stand in several dictionaries, but its own node only in one: it is free while it has no object.
+    CmHashNode* own = nodeOf(object);
+    if (own && !own->object)
+    {
+        own->object = object;
+        return own;
+    }
+    CmHashNode* made = CmHashTable::makeNode(object);
+    if (made)
         _apart++;
-    return node;
+    return made;
 }
 
 void CmAssociationTable::dropNode(CmHashNode* node)
 {
-    if (static_cast<CmAssociation*>(node->object)->ownNode() == node)
+    if (nodeOf(node->object) == node)
     {
         node->object = nullptr;
         return;

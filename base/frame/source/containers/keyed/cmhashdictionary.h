@@ -8,6 +8,7 @@
 class CmHashAssociation final : public CmAssociation, private CmHashNode
 {
 public:
+    // Both bases have these operators.
     FPOOLED_OBJECTS
 
     CmHashAssociation(CmObject* itsKey, CmObject* itsObject) : CmAssociation(itsKey, itsObject), CmHashNode{}
@@ -16,7 +17,8 @@ public:
     CmHashAssociation(const CmHashAssociation&) = delete;
     CmHashAssociation& operator=(const CmHashAssociation&) = delete;
 
-    CmHashNode* ownNode() override { return this; }
+    CmHashAssociation* withNode() override { return this; }
+    CmHashNode* ownNode() { return this; }
     /// The pair that `node` is part of; it has to be part of one.
     static CmHashAssociation* around(CmHashNode* node) { return static_cast<CmHashAssociation*>(node); }
 };
@@ -27,26 +29,25 @@ class CmAssociationTable : public CmHashTable
 {
 protected:
     using CmHashTable::CmHashTable;
+    CmAssociationTable& operator=(const CmAssociationTable&) = delete;
 
-    /// The first association whose key is equal to `key`; null where there is none.
-    CmAssociation* lookupKey(const CmObject* key) const;
-    /// As takeEqual, by the key.
-    CmAssociation* takeKey(const CmObject* key);
+    // As those for objects. `probe` is of no derived class and has a key.
+    using CmHashTable::lookup;
+    using CmHashTable::takeEqual;
+    CmObject* lookup(const CmAssociation* probe) const;
+    CmObject* takeEqual(const CmAssociation* probe);
     CmHashNode* makeNode(CmObject* object) override;
     void dropNode(CmHashNode* node) override;
 
 private:
-    /// Whether all elements hash and compare as their keys do, so that there is no need for an association to ask.
+    /// Whether the chains can be searched by the key itself: there are buckets, and every element is a
+    /// CmHashAssociation in the bucket that its key's hash told.
     bool isSearchedByKey() const { return _apart == 0 && !hashFunction() && _size > 0; }
 
-    /// The number of nodes that are no part of a pair.
+    /// The number of nodes that are no part of a CmHashAssociation.
     int32 _apart = 0;
 };
 
-template <>
-CmAssociation* CmDictionaryOf<CmAssociationTable, CmHashAssociation>::findPair(const CmObject* key) const;
-template <>
-CmAssociation* CmDictionaryOf<CmAssociationTable, CmHashAssociation>::takePair(const CmObject* key);
 extern template class CmDictionaryOf<CmAssociationTable, CmHashAssociation>;
 
 /// The dictionary for text keys, found by hash. One thread at a time.

@@ -10,16 +10,19 @@ DEFINE_CLASS(CmString, CmObject)
 
 namespace
 {
-/// Keys of tables have mostly some ten characters, for which a call would take longer than the comparison.
-bool areSame(const void* left, const void* right, size_t bytes)
+/// 0 where 16 bytes are the same.
+uint64 difference16(const char* a, const char* b)
+{
+    return (wordAt(a) ^ wordAt(b)) | (wordAt(a + 8) ^ wordAt(b + 8));
+}
+
+/// Keys of tables have mostly some ten characters, for which a call would take longer than the comparison: the first 16
+/// bytes and the last 16, which may overlap. Keys differ anywhere, so that a branch between them would be guessed wrong.
+bool areSame(const char* a, const char* b, size_t bytes)
 {
     if (bytes < 16 || bytes > 32)
-        return bytes == 0 || memcmp(left, right, bytes) == 0;
-    const char* a = static_cast<const char*>(left);
-    const char* b = static_cast<const char*>(right);
-    const size_t end = bytes - 16;
-    return ((wordAt(a) ^ wordAt(b)) | (wordAt(a + 8) ^ wordAt(b + 8)) | (wordAt(a + end) ^ wordAt(b + end)) |
-            (wordAt(a + end + 8) ^ wordAt(b + end + 8))) == 0;
+        return bytes == 0 || memcmp(a, b, bytes) == 0;
+    return (difference16(a, b) | difference16(a + bytes - 16, b + bytes - 16)) == 0;
 }
 } // namespace
 
@@ -30,7 +33,8 @@ bool CmString::isEqual(const CmObject* other) const
         return CmObject::isEqual(other);
     if (!isWide || !text->isWide || len != text->len)
         return FString::compare(*text) == 0;
-    return areSame(buffer, text->buffer, len * sizeof(char16));
+    return areSame(static_cast<const char*>(buffer), static_cast<const char*>(text->buffer),
+                   len * sizeof(char16));
 }
 
 int CmString::compare(const CmObject* other) const

@@ -1,6 +1,7 @@
 #include "storage/xml/xmlsourcetext.h"
 
 #include "foundation/object/blockpool.h"
+#include "foundation/object/wordat.h"
 #include "foundation/text/charwidth.h"
 
 #include <cstddef>
@@ -89,8 +90,7 @@ void SourceText::judge()
     const char* const limit = reinterpret_cast<const char*>(block) + bytesFor(block->size);
     for (const char* place = block->text(); place < limit; place += sizeof(uint64))
     {
-        uint64 bytes = 0;
-        memcpy(&bytes, place, sizeof(bytes));
+        const uint64 bytes = wordAt(place);
         all |= bytes;
         isPlain = isPlain && !hasMarkup(bytes);
     }
@@ -102,15 +102,9 @@ bool SourceText::isPlain(std::string_view text) const
 {
     const char* const limit = reinterpret_cast<const char*>(block) + bytesFor(block->size);
     const char* const textEnd = text.data() + text.size();
-    uint64 bytes = 0;
-    for (const char* place = text.data(); place < textEnd; place += sizeof(bytes))
-    {
-        if (limit - place < static_cast<std::ptrdiff_t>(sizeof(bytes)))
+    for (const char* place = text.data(); place < textEnd; place += sizeof(uint64))
+        if (limit - place < static_cast<std::ptrdiff_t>(sizeof(uint64)) || hasMarkup(wordAt(place)))
             return false;
-        memcpy(&bytes, place, sizeof(bytes));
-        if (hasMarkup(bytes))
-            return false;
-    }
     return true;
 }
 
