@@ -113,13 +113,8 @@ bool String::resize(unsigned newLength, bool wide, bool fill)
 
     const std::size_t oldSize = buffer ? (std::size_t{len} + 1) * charSize(isWide) : 0;
     const std::size_t newSize = (std::size_t{newLength} + 1) * charSize(wide);
-    if (newSize != oldSize)
-    {
-        void* changed = std::realloc(buffer, newSize);
-        if (!changed)
-            return false;
-        buffer = changed;
-    }
+    if (newSize != oldSize && !reallocate(newSize))
+        return false;
     isWide = wide;
     if (oldSize == 0)
         terminate(0);
@@ -131,6 +126,14 @@ bool String::resize(unsigned newLength, bool wide, bool fill)
         terminate(newLength);
     }
     return true;
+}
+
+bool String::reallocate(std::size_t size)
+{
+    void* changed = std::realloc(buffer, size);
+    if (changed)
+        buffer = changed;
+    return changed != nullptr;
 }
 
 void String::terminate(unsigned index)

@@ -65,8 +65,8 @@ public:
     String& append(const char* text, int count = -1);
     String& append(const char16* text, int count = -1);
     String& append(const ConstString& text, int count = -1);
-    String& append(char character);
-    String& append(char16 character);
+    String& append(char character) { return appendCharacter(character); }
+    String& append(char16 character) { return appendCharacter(character); }
     String& append(char character, int count);
     String& append(char16 character, int count);
     String& operator+=(const ConstString& text) { return append(text); }
@@ -181,8 +181,6 @@ private:
     template <class Char>
     String& assignRun(Char character, int count);
     template <class Char>
-    bool hasTextOf() const;
-    template <class Char>
     String& appendCharacter(Char character);
     template <class Char>
     String& appendRun(Char character, int count);
@@ -190,7 +188,10 @@ private:
     String& appendText(const Char* text, unsigned count);
     template <class Char>
     Char* extend(unsigned count);
-    bool enlarge(std::size_t size);
+    /// Lets the buffer have at least as many bytes. Blocks come in steps of some bytes: one that is large enough as it
+    /// is would come back unchanged.
+    bool enlarge(std::size_t size) { return size <= blockSizeOf(buffer) || reallocate(size); }
+    bool reallocate(std::size_t size);
     template <class Char>
     String& splice(unsigned index, unsigned removed, const Char* text, unsigned count);
     template <class Char>
@@ -206,3 +207,21 @@ private:
     String& insertAt(unsigned index, const char* text, int count, bool isTerminated);
     String& insertAt(unsigned index, const char16* text, int count, bool isTerminated);
 };
+
+/// The plain case by itself: texts are often put together character by character, and most of them fit the block as it
+/// is.
+template <class Char>
+String& String::appendCharacter(Char character)
+{
+    const bool isPlain =
+        character != 0 && len > 0 && len < kMaxTextLength && charSize(isWide) == sizeof(Char);
+    if (!isPlain)
+        return append(character, 1);
+    if (!enlarge((std::size_t{len} + 2) * sizeof(Char)))
+        return *this;
+    Char* place = chars<Char>() + len;
+    place[0] = character;
+    place[1] = 0;
+    len = (len + 1) & kMaxTextLength;
+    return *this;
+}

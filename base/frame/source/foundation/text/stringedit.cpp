@@ -105,24 +105,6 @@ String& String::assignRun(Char character, int count)
     return *this;
 }
 
-/// Whether there are characters, and of this width.
-template <class Char>
-bool String::hasTextOf() const
-{
-    return len > 0 && (isWide != 0) == kIsWide<Char>;
-}
-
-/// The plain case by itself: texts are often put together character by character.
-template <class Char>
-String& String::appendCharacter(Char character)
-{
-    if (!hasTextOf<Char>() || character == 0)
-        return append(character, 1);
-    if (Char* place = extend<Char>(1))
-        *place = character;
-    return *this;
-}
-
 template <class Char>
 String& String::appendRun(Char character, int count)
 {
@@ -145,18 +127,6 @@ String& String::appendText(const Char* text, unsigned count)
     if (Char* place = extend<Char>(count))
         std::memcpy(place, isOwn ? chars<Char>() + offset : text, count * sizeof(Char));
     return *this;
-}
-
-/// Lets the buffer have at least as many bytes. Blocks come in steps of some bytes: one that is large enough as it is
-/// would come back unchanged.
-inline bool String::enlarge(std::size_t size)
-{
-    if (size <= blockSizeOf(buffer))
-        return true;
-    void* larger = std::realloc(buffer, size);
-    if (larger)
-        buffer = larger;
-    return larger != nullptr;
 }
 
 /// Lets the text, which has this width, be longer by as many characters; gives the place of the first of them.
@@ -341,16 +311,6 @@ String& String::append(const char16* text, int count)
 String& String::append(const ConstString& text, int count)
 {
     return insertAt(len, text, count);
-}
-
-String& String::append(char character)
-{
-    return appendCharacter(character);
-}
-
-String& String::append(char16 character)
-{
-    return appendCharacter(character);
 }
 
 String& String::append(char character, int count)
