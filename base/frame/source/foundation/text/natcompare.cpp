@@ -38,7 +38,7 @@ int measureDigits(const Char* text)
     return static_cast<int>(end - text);
 }
 
-/// Compares the digit runs at both places and steps behind them.
+/// Compares the digit runs at both places; steps behind them where they are alike.
 template <class Char>
 int compareNumbers(const Char*& a, const Char*& b)
 {
@@ -47,8 +47,10 @@ int compareNumbers(const Char*& a, const Char*& b)
     for (; isDigitAt(a) && isDigitAt(b); ++a, ++b)
         firstDifference = firstDifference ? firstDifference : *a - *b;
     // At most one of them goes on.
-    if (const int difference = measureDigits(a) - measureDigits(b))
-        return difference;
+    if (isDigitAt(a))
+        return measureDigits(a);
+    if (isDigitAt(b))
+        return -measureDigits(b);
     return firstDifference ? firstDifference : zeros;
 }
 
@@ -61,12 +63,20 @@ int compareCharacters(Char a, Char b, bool caseSensitive)
                          : valueOf(ConstString::toUpper(a)) - valueOf(ConstString::toUpper(b));
 }
 
+/// Steps over characters that are the same in both texts, and no digits: names of files have many of them.
+template <class Char>
+void skipAlike(const Char*& a, const Char*& b)
+{
+    for (; *a == *b && *a != 0 && !isDigitAt(a); ++b)
+        ++a;
+}
+
 template <class Char>
 int compareNaturally(const Char* a, const Char* b, bool caseSensitive)
 {
     if (!a || !b)
         return (a ? 1 : 0) - (b ? 1 : 0);
-    while (*a && *b)
+    for (skipAlike(a, b); *a && *b; skipAlike(a, b))
     {
         const bool areNumbers = isDigitAt(a) && isDigitAt(b);
         const int difference =
