@@ -1,6 +1,12 @@
 #include "xmltestsupport.h"
 
+#include "foundation/object/iptr.h"
+#include "foundation/text/cmstring.h"
+
 #include <gtest/gtest.h>
+
+#include <algorithm>
+#include <vector>
 
 TEST(FXmlParser, TellsElementsAttributesAndText)
 {
@@ -297,6 +303,27 @@ TEST(FXmlParser, ReadsTagsThatAnyBlockCuts)
         EXPECT_EQ(told(std::string(before, ' ') + tags), result) << before;
 }
 
+TEST(FXmlParser, ReadsNoMoreThanATagNeeds)
+{
+    struct ShortStream : TextStream
+    {
+        using TextStream::TextStream;
+        int64 readRaw(void* target, int64 count) override
+        {
+            return TextStream::readRaw(target, std::min<int64>(count, 8));
+        }
+    };
+    ShortStream trickle("<a b=1 x='this is not asked for'>");
+    RecordingParser patient(trickle);
+    EXPECT_FALSE(patient.process(nullptr));
+    EXPECT_EQ(trickle.tell(), 8) << "the first eight bytes tell the fault";
+
+    TextStream endless("<a " + std::string(100000, 'b'));
+    RecordingParser parser(endless);
+    EXPECT_FALSE(parser.process(nullptr));
+    EXPECT_LE(endless.tell(), 3 * 2048);
+}
+
 TEST(FXmlParser, PutsBytesBack)
 {
     for (bool buffered : {true, false})
@@ -377,6 +404,27 @@ TEST(FXmlParser, KeepsAttributeObjectsForReuse)
     TextStream stream("<a b='1'><c d='2'/><e f='3'/></a>");
     Parser parser(stream);
     EXPECT_TRUE(parser.process(nullptr));
+}
+
+TEST(FXmlParser, LeavesNamesThatAHandlerKeeps)
+{
+    struct Parser : RecordingParser
+    {
+        using RecordingParser::RecordingParser;
+        bool startTag(const char*, CmContainer&, bool, void*) override
+        {
+            kept.emplace_back(static_cast<CmString*>(tagStack.peek()));
+            return true;
+        }
+        std::vector<IPtr<CmString>> kept;
+    };
+    TextStream stream("<a><b></b><c></c></a><d></d>");
+    Parser parser(stream);
+    EXPECT_TRUE(parser.process(nullptr));
+    std::string names;
+    for (const IPtr<CmString>& name : parser.kept)
+        names += narrow(*name);
+    EXPECT_EQ(names, "abcd");
 }
 
 TEST(FXmlParser, BeginsAnewWithAnotherStream)

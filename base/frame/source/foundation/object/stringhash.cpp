@@ -100,6 +100,8 @@ bool hasNegative(uint64 word)
 template <class Character>
 unsigned hashWords(const Character* text, size_t length, unsigned size)
 {
+    if (size > kLargestShared || std::endian::native != std::endian::little)
+        return hashByRule(text, length, size);
     size_t done = (length - 1) % kWord<Character> + 1;
     uint64 all = startOf(text, done, length);
     uint64 hash = sumOf<Character>(all);
@@ -129,8 +131,8 @@ constexpr unsigned kLargestFor16Bits = 1u << 15;
 
 /// The remainders of the powers of 64 for one number of buckets, the one that the thread goes on asking for.
 ///
-/// To find them takes as long as some twenty hashes, so the number has to be asked for often, and no other meanwhile.
-/// One thread at a time.
+/// To find them takes as long as some twenty hashes, so a number is learnt only when it was asked for often, and no other
+/// unknown one meanwhile. One thread at a time.
 template <class Character>
 class Powers
 {
@@ -194,7 +196,7 @@ uint32 blockSum(const Character* text, const int16* factors)
 template <class Character>
 bool isBlockPair(size_t length)
 {
-    return length - kBlock<Character> <= kBlock<Character>;
+    return length >= kBlock<Character> && length <= 2 * kBlock<Character>;
 }
 
 template <class Character>
@@ -215,11 +217,7 @@ unsigned hashText(const Character* text, size_t length, unsigned size)
 {
     if (isBlockPair<Character>(length) && powers<Character>.areFor(size))
         return hashBlocks(text, length, size);
-    if (size == 0 || length == 0)
-        return 0;
-    if (size > kLargestShared || std::endian::native != std::endian::little)
-        return hashByRule(text, length, size);
-    return hashWords(text, length, size);
+    return size > 0 && length > 0 ? hashWords(text, length, size) : 0;
 }
 } // namespace
 

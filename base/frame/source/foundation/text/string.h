@@ -10,7 +10,8 @@ class IAttributes;
 
 /// A text that owns its characters and changes their width when it must.
 ///
-/// The buffer comes from `malloc` and is exactly as large as the text; there is no spare room. A default String is
+/// The buffer comes from `malloc`, which is asked for exactly as much as the text takes; only `refill` keeps a block that
+/// is larger. A default String is
 /// empty and wide. An empty String takes the width of what is put into it; a narrow one becomes wide when 16-bit
 /// text is added; nothing here makes a wide one narrow but `text8`, `toMultiByte` and a new content.
 ///
@@ -186,6 +187,7 @@ private:
     String& appendRun(Char character, int count);
     template <class Char>
     String& appendText(const Char* text, unsigned count);
+    /// Lets the text, which has this width, be longer by as many characters; gives the place of the first of them.
     template <class Char>
     Char* extend(unsigned count);
     /// Lets the buffer have at least as many bytes. Blocks come in steps of some bytes: one that is large enough as it
@@ -208,20 +210,27 @@ private:
     String& insertAt(unsigned index, const char16* text, int count, bool isTerminated);
 };
 
+template <class Char>
+Char* String::extend(unsigned count)
+{
+    const std::size_t newLength = std::size_t{len} + count;
+    if (newLength > kMaxTextLength || !enlarge((newLength + 1) * sizeof(Char)))
+        return nullptr;
+    Char* place = chars<Char>() + len;
+    place[count] = 0;
+    len = static_cast<unsigned>(newLength) & kMaxTextLength;
+    return place;
+}
+
 /// The plain case by itself: texts are often put together character by character, and most of them fit the block as it
 /// is.
 template <class Char>
 String& String::appendCharacter(Char character)
 {
-    const bool isPlain =
-        character != 0 && len > 0 && len < kMaxTextLength && charSize(isWide) == sizeof(Char);
+    const bool isPlain = character != 0 && len > 0 && charSize(isWide) == sizeof(Char);
     if (!isPlain)
         return append(character, 1);
-    if (!enlarge((std::size_t{len} + 2) * sizeof(Char)))
-        return *this;
-    Char* place = chars<Char>() + len;
-    place[0] = character;
-    place[1] = 0;
-    len = (len + 1) & kMaxTextLength;
+    if (Char* place = extend<Char>(1))
+        *place = character;
     return *this;
 }

@@ -129,21 +129,6 @@ String& String::appendText(const Char* text, unsigned count)
     return *this;
 }
 
-/// Lets the text, which has this width, be longer by as many characters; gives the place of the first of them.
-template <class Char>
-Char* String::extend(unsigned count)
-{
-    const std::size_t newLength = std::size_t{len} + count;
-    if (newLength > kMaxTextLength)
-        return nullptr;
-    if (!enlarge((newLength + 1) * sizeof(Char)))
-        return nullptr;
-    Char* place = chars<Char>() + len;
-    place[count] = 0;
-    len = static_cast<unsigned>(newLength) & kMaxTextLength;
-    return place;
-}
-
 template <class Char>
 String& String::splice(unsigned index, unsigned removed, const Char* text, unsigned count)
 {

@@ -66,9 +66,7 @@ int32 FPlugXmlParser::repositionStream()
     const int64 position = getStreamPosition();
     if (stream->seek(position, kSeekStart) != position)
         return kStreamFailed;
-    buffer.setFillSize(0);
-    bufferPos = 0;
-    lookAhead = 0;
+    dropBuffer();
     return kResultOk;
 }
 

@@ -11,7 +11,7 @@ class FXmlAttributeList : public CmArray
 
     FXmlAttributeList() : CmArray(0, 10) {}
 
-    /// As `add`.
+    /// As `add`, of what isn't null.
     bool put(FXmlAttribute* attribute)
     {
         if (!makeRoom())

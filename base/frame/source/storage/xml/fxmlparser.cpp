@@ -63,10 +63,7 @@ void FXmlParser::gotComment(const char*, void*, bool) {}
 void FXmlParser::setStream(FStream* newStream)
 {
     stream = newStream;
-    buffer.setFillSize(0);
-    closeBuffer();
-    bufferPos = 0;
-    lookAhead = 0;
+    dropBuffer();
     line = 1;
     error = kNoError;
     stopRequested = false;
@@ -207,7 +204,7 @@ void FXmlParser::removeEntities(char* text, bool* sawHighBit, bool windowsTable)
         text[decodeReferences(text, text, sawHighBit, windowsTable)] = 0;
 }
 
-/// Writes the decoded text, not terminated, to `target`, which may lie at the text itself or in front of it. Gives its
+/// Writes the decoded text, not terminated, to `target`, which may lie at the text itself, in front of it or elsewhere. Gives its
 /// length. Each '&' is looked at once; the next ';' is looked for only when the last one found has been passed.
 size_t FXmlParser::decodeReferences(std::string_view text, char* target, bool* sawHighBit, bool windowsTable)
 {

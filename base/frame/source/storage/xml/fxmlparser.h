@@ -137,6 +137,9 @@ public:
     static constexpr int kMaxDepth = 5000;
 
 protected:
+    /// Forgets what was read ahead.
+    void dropBuffer();
+
     IPtr<FStream> stream;
     int32 line = 1;
     bool skipping = false;
@@ -144,6 +147,7 @@ protected:
     uint32 bufferPos = 0;
     char lookAhead = 0;
     int32 error = kNoError;
+    /// A block, with zeros behind the data that end every search.
     CmBuffer buffer;
     CmStack tagStack;
     /// Objects for reuse, each with one reference.
@@ -219,7 +223,7 @@ private:
     void recycle(FXmlAttributeList& attributes);
     void fail(Error code);
 
-    // What lies whole in the buffer. False or null, with nothing read, where it doesn't
+    // What lies whole in the buffer; false, with nothing taken, where it doesn't
     bool takePlainTagName();
     bool takePlainTagEnd(Token& ending)
     {
@@ -232,8 +236,8 @@ private:
         return isEnd;
     }
     bool takePlainEndTag();
-    bool readOnInsideTag();
     void takePlainAttributes(FXmlAttributeList& attributes);
+    bool readOnInsideTag();
     void passPlain(const char* end)
     {
         bufferPos = static_cast<uint32>(end - buffer.ptr());
@@ -250,11 +254,13 @@ private:
     }
 
     const uint32 blockSize;
+    /// Whether the last block that was read had all bytes that it can have.
+    bool isBlockWhole = false;
     Buffer tokenBuffer;
     Buffer tagName;
     /// That of the last tag, for the next one. Null while in use.
     IPtr<FXmlAttributeList> spareAttributes;
-    /// The texts of elements that ended, each with one reference.
+    /// The names of elements that ended, each with the only reference.
     CmArray spareNames;
     /// The line end that was counted last, while the next byte may still belong to it.
     char lastLineEnd = 0;

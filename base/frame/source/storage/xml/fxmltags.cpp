@@ -99,12 +99,12 @@ void FXmlParser::tellStartTag(FXmlAttributeList& attributes, bool isEmpty, void*
         fail(kErrorUnexpectedTag);
 }
 
-// The object of an element that was closed, unless a handler is still looking at that name.
+// The object of an element that was closed, if there is one.
 CmString* FXmlParser::newTagName()
 {
     const int last = spareNames.total() - 1;
     auto* name = static_cast<CmString*>(spareNames.at(last));
-    if (!name || name->getRefCount() > 1)
+    if (!name)
         return new CmString(tagName.ptr());
     spareNames.removeAt(last);
     name->refill(tagName.ptr(), static_cast<unsigned>(strlen(tagName.ptr())));
@@ -125,7 +125,8 @@ void FXmlParser::endElement(void* data)
     auto* name = static_cast<CmString*>(tagStack.pop());
     if (error == kNoError && !skipping && !endTag(name->text8(), data))
         fail(kErrorUnexpectedTag);
-    if (name && !spareNames.add(name))
+    // A name that a handler keeps is no longer ours to change.
+    if (name && (name->getRefCount() > 1 || !spareNames.add(name)))
         name->release();
 }
 
@@ -197,11 +198,13 @@ inline FXmlAttribute* FXmlParser::makeAttribute(std::string_view name, std::stri
     return attribute;
 }
 
-/// Whether more was read of a tag that goes on behind the buffer, so that its attributes lie whole in there.
+/// Whether more was read of a tag that goes on behind the buffer, so that its attributes lie whole in there. A stream
+/// that gives less than it was asked for isn't asked for more than the tokens need.
 bool FXmlParser::readOnInsideTag()
 {
     const uint32 unread = buffer.getFillSize() - bufferPos;
-    return blockSize > 1 && unread < kMaxToken && !memchr(buffer + bufferPos, '>', unread) && refill();
+    return blockSize > 1 && isBlockWhole && unread < kMaxToken && !memchr(buffer + bufferPos, '>', unread) &&
+           refill();
 }
 
 /// Those behind blanks, up to the first that the tokenizer has to look at.

@@ -64,7 +64,16 @@ bool FXmlParser::refill()
     const int64 count = stream->readRaw(buffer + unread, blockSize);
     buffer.setFillSize(unread + (count > 0 ? static_cast<uint32>(count) : 0));
     closeBuffer();
+    isBlockWhole = count == static_cast<int64>(blockSize);
     return count > 0;
+}
+
+void FXmlParser::dropBuffer()
+{
+    buffer.setFillSize(0);
+    closeBuffer();
+    bufferPos = 0;
+    lookAhead = 0;
 }
 
 // Puts the zeros behind the data at which each search ends. There must be room for them.
