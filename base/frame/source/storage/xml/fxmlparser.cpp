@@ -204,8 +204,8 @@ void FXmlParser::removeEntities(char* text, bool* sawHighBit, bool windowsTable)
         text[decodeReferences(text, text, sawHighBit, windowsTable)] = 0;
 }
 
-/// Writes the decoded text, not terminated, to `target`, which may lie at the text itself, in front of it or elsewhere. Gives its
-/// length. Each '&' is looked at once; the next ';' is looked for only when the last one found has been passed.
+/// Writes the decoded text, not terminated, to `target`, which may lie at the text itself, in front of it or elsewhere.
+/// Gives its length. Each '&' is looked at once; the next ';' is looked for only when the last one found has been passed.
 size_t FXmlParser::decodeReferences(std::string_view text, char* target, bool* sawHighBit, bool windowsTable)
 {
     const char* from = text.data();

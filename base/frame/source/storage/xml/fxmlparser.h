@@ -246,7 +246,7 @@ private:
     bool isAtEndTag() const
     {
         const char* const begin = buffer + bufferPos;
-        return begin[0] == '<' && begin[1] == '/';
+        return bufferPos < buffer.getFillSize() && begin[0] == '<' && begin[1] == '/';
     }
     bool mayProtectQuote(std::string_view value) const
     {

@@ -134,7 +134,8 @@ void FXmlParser::endElement(void* data)
 bool FXmlParser::takePlainTagName()
 {
     const char* const begin = buffer + bufferPos;
-    if (begin[0] != '<' || begin[1] == '!' || begin[1] == '/' || begin[1] == '?')
+    if (bufferPos >= buffer.getFillSize() || begin[0] != '<' || begin[1] == '!' || begin[1] == '/' ||
+        begin[1] == '?')
         return false;
     const char* const end = FXmlScan::findEnd(begin + 1, endsTagName);
     const bool isEnd = Xml::isXmlSpace(*end) || *end == '/' || *end == '>';

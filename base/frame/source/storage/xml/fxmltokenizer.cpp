@@ -76,10 +76,11 @@ void FXmlParser::dropBuffer()
     lookAhead = 0;
 }
 
-// Puts the zeros behind the data at which each search ends. There must be room for them.
+// Puts the zeros behind the data at which each search ends; there is room for them, unless there was no memory at all.
 void FXmlParser::closeBuffer()
 {
-    memset(buffer + buffer.getFillSize(), 0, FXmlScan::kStep);
+    if (buffer.getSize() > 0)
+        memset(buffer + buffer.getFillSize(), 0, FXmlScan::kStep);
 }
 
 bool FXmlParser::hasBytes(uint32 count)
